@@ -4,6 +4,7 @@
 // with none installed they are dropped. Thread-safe: entries may come from any thread.
 #include <cstddef>
 #include <functional>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -21,7 +22,8 @@ using TErrLogSink = std::function<void(const TErrLogEntry&)>;
 
 SVYUTILS_API void svy_err_log(const char* file, int line, const char* message);
 
-// Installs sink (an empty function removes it) and returns the one it replaces.
+// Installs sink (an empty function removes it) and returns the one it replaces. The sink is called
+// outside the log's lock, so it may itself log; it must be safe to call from several threads at once.
 SVYUTILS_API TErrLogSink setErrLogSink(TErrLogSink sink);
 
 // Collects the entries logged while it lives (on any thread), then restores the previous sink.
@@ -37,7 +39,7 @@ class SVYUTILS_API CScopedErrLogCapture {
 
  private:
   struct State;
-  State* state_;
+  std::shared_ptr<State> state_;  // shared with the installed sink, which may outlive this object briefly
   TErrLogSink previous_;
 };
 
