@@ -11,3 +11,6 @@
 #include "svymath/foundation/angle_functions.h"
 #include "svymath/foundation/arc.h"
 #include "svymath/foundation/unit_conversions.h"
+#include "svymath/formats/station_text.h"
+#include "svymath/formats/dms_text.h"
+#include "svymath/formats/round_double.h"
