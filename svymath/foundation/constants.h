@@ -20,6 +20,15 @@ constexpr double kZero = 1e-12;
 constexpr double kOffsetZero = 1e-05;
 // Snap of a length or chainage to an element's end, and the tie-break between elements (metres).
 constexpr double kSnap = 0.001;
+// Geodetic latitude iteration (Cartesian to geodetic): stops when tan(latitude) changes by at most this.
+// The iteration contracts by about e^2 per step near the surface, so the remaining error is ~1e-12 rad.
+constexpr double kGeodeticIteration = 1e-10;
+// A point closer than this to the polar axis (metres) is taken as on the axis: longitude 0, latitude +-90 deg.
+constexpr double kPolarAxisDistance = 1e-10;
+// Safety cap of the latitude iteration. Surface points converge in under 10 steps; points deep inside the
+// earth near the equatorial plane (where the map's slope approaches 1) need up to a few million. Reaching
+// the cap ends with NaN instead of looping.
+constexpr int kGeodeticIterationCap = 100000000;
 
 }  // namespace tol
 
@@ -31,6 +40,13 @@ constexpr double kHalfPi = 1.5707963267948966;
 // Degrees <-> radians, the exact double constants the angle functions multiply by.
 constexpr double kDegToRad = 0.017453292519943295;
 constexpr double kRadToDeg = 57.29577951308232;
+// Time of day and GPS weeks.
+constexpr double kSecondsPerDay = 86400.0;
+constexpr double kSecondsPerHour = 3600.0;
+constexpr double kSecondsPerMinute = 60.0;
+constexpr double kMinutesPerDay = 1440.0;
+constexpr double kHoursPerDay = 24.0;
+constexpr int kDaysPerWeek = 7;
 
 }  // namespace units
 
