@@ -1,0 +1,31 @@
+// svy: surveying computations on rows of CSV, one verb family per subcommand.
+#include "row_io.h"
+#include "verbs.h"
+
+#include <CLI/CLI.hpp>
+
+#include <iostream>
+
+int main(int argc, char** argv) {
+  CLI::App app{"svy: surveying computations on rows of CSV (file argument or standard input)", "svy"};
+  app.require_subcommand(1);
+  // Global options are accepted after the verb too: "svy cogo inverse --json points.csv".
+  app.fallthrough();
+  app.add_flag("--json", "Write a JSON array of objects instead of CSV");
+  app.add_flag("--full-precision", "Write numbers with 17 significant digits (they read back exactly)");
+
+  try {
+    app.parse(argc, argv);
+  } catch (const CLI::CallForHelp& e) {
+    return app.exit(e);
+  } catch (const CLI::CallForAllHelp& e) {
+    return app.exit(e);
+  } catch (const CLI::RuntimeError& e) {
+    // Raised by a verb after all its rows are written: the bad rows are already reported.
+    return e.get_exit_code();
+  } catch (const CLI::Error& e) {
+    std::cerr << "svy: " << e.what() << '\n';
+    return svy_tool::kExitUsage;
+  }
+  return svy_tool::kExitOk;
+}

@@ -1,0 +1,318 @@
+#include "row_io.h"
+
+#include <CLI/CLI.hpp>
+#include <nlohmann/json.hpp>
+
+#include <algorithm>
+#include <cctype>
+#include <cerrno>
+#include <charconv>
+#include <cmath>
+#include <cstdio>
+#include <cstring>
+#include <fstream>
+#include <iostream>
+#include <system_error>
+
+namespace svy_tool {
+
+namespace {
+
+// 17 significant digits read back to the same double (DBL_DECIMAL_DIG).
+constexpr int kRoundTripDigits = 17;
+// Widest fixed-point text we write: 309 integer digits of DBL_MAX, the point and up to 17 decimals.
+constexpr std::size_t kNumberBufferSize = 400;
+constexpr int kMaxDecimals = 17;
+
+bool isBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\f' || c == '\v'; }
+
+std::string trim(const std::string& text) {
+  std::size_t first = 0;
+  std::size_t last = text.size();
+  while (first < last && isBlank(text[first])) ++first;
+  while (last > first && isBlank(text[last - 1])) --last;
+  return text.substr(first, last - first);
+}
+
+bool equalNoCase(const std::string& a, const std::string& b) {
+  return a.size() == b.size() && std::equal(a.begin(), a.end(), b.begin(), [](char x, char y) {
+           return std::tolower(static_cast<unsigned char>(x)) == std::tolower(static_cast<unsigned char>(y));
+         });
+}
+
+// Splits one CSV line: commas separate fields, double quotes protect commas, "" inside quotes is a quote.
+std::vector<std::string> splitCsv(const std::string& line) {
+  std::vector<std::string> fields;
+  std::string field;
+  bool quoted = false;
+  bool wasQuoted = false;
+  for (std::size_t i = 0; i < line.size(); ++i) {
+    const char c = line[i];
+    if (quoted) {
+      if (c == '"' && i + 1 < line.size() && line[i + 1] == '"') {
+        field += '"';
+        ++i;
+      } else if (c == '"') {
+        quoted = false;
+      } else {
+        field += c;
+      }
+    } else if (c == '"' && trim(field).empty()) {
+      field.clear();
+      quoted = true;
+      wasQuoted = true;
+    } else if (c == ',') {
+      fields.push_back(wasQuoted ? field : trim(field));
+      field.clear();
+      wasQuoted = false;
+    } else if (!(wasQuoted && isBlank(c))) {
+      field += c;
+    }
+  }
+  fields.push_back(wasQuoted ? field : trim(field));
+  return fields;
+}
+
+bool isContentLine(const std::string& line) {
+  for (char c : line) {
+    if (!isBlank(c)) return c != '#';
+  }
+  return false;
+}
+
+std::string quoteCsv(const std::string& text) {
+  if (text.find_first_of(",\"\n\r") == std::string::npos && trim(text) == text) return text;
+  std::string quoted = "\"";
+  for (char c : text) {
+    if (c == '"') quoted += '"';
+    quoted += c;
+  }
+  return quoted + '"';
+}
+
+std::string plural(std::size_t count, const char* singular, const char* pluralForm) {
+  return count == 1 ? singular : pluralForm;
+}
+
+// "expected 4 numbers, got 3" / "expected 2 to 3 numbers, got 1" / "expected 1 field, got 2".
+std::string fieldCountMessage(const RowFormat& format, std::size_t got) {
+  const std::size_t most = format.inputs.size();
+  const std::size_t least = format.requiredInputs == 0 ? most : std::min(format.requiredInputs, most);
+  const char* one = format.numericInput ? "number" : "field";
+  const char* many = format.numericInput ? "numbers" : "fields";
+  std::string message = "expected " + std::to_string(least);
+  if (least != most) message += " to " + std::to_string(most);
+  return message + " " + plural(most, one, many) + ", got " + std::to_string(got);
+}
+
+bool fieldCountFits(const RowFormat& format, std::size_t count) {
+  const std::size_t most = format.inputs.size();
+  const std::size_t least = format.requiredInputs == 0 ? most : std::min(format.requiredInputs, most);
+  return count >= least && count <= most;
+}
+
+}  // namespace
+
+bool parseNumber(const std::string& text, double& value) {
+  const std::string body = trim(text);
+  const char* first = body.data();
+  const char* last = body.data() + body.size();
+  // One optional sign; from_chars takes only '-', and also reads "inf" and "nan", which are refused here.
+  if (first != last && (*first == '+' || *first == '-')) ++first;
+  if (first == last || !(std::isdigit(static_cast<unsigned char>(*first)) || *first == '.')) return false;
+  const bool negative = body[0] == '-';
+  double parsed = 0.0;
+  const auto result = std::from_chars(first, last, parsed, std::chars_format::general);
+  if (result.ec != std::errc() || result.ptr != last || !std::isfinite(parsed)) return false;
+  value = negative ? -parsed : parsed;
+  return true;
+}
+
+std::string formatNumber(double value, int decimals) {
+  if (std::isnan(value)) return "nan";
+  if (std::isinf(value)) return value > 0.0 ? "inf" : "-inf";
+  char buffer[kNumberBufferSize];
+  if (decimals < 0) {
+    std::snprintf(buffer, sizeof buffer, "%.*g", kRoundTripDigits, value);
+    return buffer;
+  }
+  std::snprintf(buffer, sizeof buffer, "%.*f", std::min(decimals, kMaxDecimals), value);
+  std::string text = buffer;
+  if (text[0] == '-' && text.find_first_not_of("0.", 1) == std::string::npos) text.erase(0, 1);
+  return text;
+}
+
+OutputOptions outputOptionsFor(const CLI::App& command) {
+  const CLI::App* root = &command;
+  while (root->get_parent() != nullptr) root = root->get_parent();
+  OutputOptions options;
+  options.json = root->count("--json") > 0;
+  options.fullPrecision = root->count("--full-precision") > 0;
+  return options;
+}
+
+std::shared_ptr<std::string> addInputArgument(CLI::App& verb) {
+  auto path = std::make_shared<std::string>();
+  verb.add_option("file", *path, "CSV input file (default: standard input)");
+  return path;
+}
+
+void finishVerb(int status) {
+  if (status != kExitOk) throw CLI::RuntimeError(status);
+}
+
+RowReader::RowReader(std::istream& in, std::vector<std::string> inputNames, bool numericInput)
+    : in_(in), inputNames_(std::move(inputNames)), numericInput_(numericInput) {}
+
+bool RowReader::isHeader(const std::vector<std::string>& fields) const {
+  if (fields.size() == inputNames_.size() &&
+      std::equal(fields.begin(), fields.end(), inputNames_.begin(), equalNoCase)) {
+    return true;
+  }
+  if (!numericInput_) return false;
+  double ignored = 0.0;
+  return std::none_of(fields.begin(), fields.end(), [&](const std::string& f) { return parseNumber(f, ignored); });
+}
+
+bool RowReader::next(InputRow& row) {
+  std::string line;
+  while (std::getline(in_, line)) {
+    ++lineNumber_;
+    if (!isContentLine(line)) continue;
+    std::vector<std::string> fields = splitCsv(line);
+    const bool first = !seenContent_;
+    seenContent_ = true;
+    if (first && isHeader(fields)) continue;
+    row.lineNumber = lineNumber_;
+    row.fields = std::move(fields);
+    row.numbers.clear();
+    return true;
+  }
+  return false;
+}
+
+std::unique_ptr<std::istream> openInput(const std::string& path, std::string& error) {
+  if (path.empty() || path == "-") {
+    // A non-owning view of stdin, so that callers hold every input the same way.
+    auto in = std::make_unique<std::istream>(std::cin.rdbuf());
+    return in;
+  }
+  auto file = std::make_unique<std::ifstream>(path);
+  if (!*file) {
+    error = "cannot open '" + path + "': " + std::strerror(errno);
+    return nullptr;
+  }
+  return file;
+}
+
+RowWriter::RowWriter(std::ostream& out, std::vector<Column> columns, OutputOptions options)
+    : out_(out), columns_(std::move(columns)), options_(options) {}
+
+RowWriter::~RowWriter() { finish(); }
+
+void RowWriter::start() {
+  if (started_) return;
+  started_ = true;
+  if (options_.json) {
+    out_ << '[';
+    return;
+  }
+  for (std::size_t i = 0; i < columns_.size(); ++i) out_ << (i ? "," : "") << quoteCsv(columns_[i].name);
+  out_ << '\n';
+}
+
+std::string RowWriter::csvCell(const Cell& cell, const Column& column) const {
+  if (const auto* text = std::get_if<std::string>(&cell)) return quoteCsv(*text);
+  return formatNumber(std::get<double>(cell), options_.fullPrecision ? -1 : column.decimals);
+}
+
+void RowWriter::write(const std::vector<Cell>& cells) {
+  start();
+  const std::size_t count = std::min(cells.size(), columns_.size());
+  if (options_.json) {
+    nlohmann::ordered_json object = nlohmann::ordered_json::object();
+    for (std::size_t i = 0; i < count; ++i) {
+      const Column& column = columns_[i];
+      if (const auto* text = std::get_if<std::string>(&cells[i])) {
+        object[column.name] = *text;
+        continue;
+      }
+      const double value = std::get<double>(cells[i]);
+      double shown = value;
+      // The rounded value, so that JSON and CSV agree; JSON gives it back in its shortest exact form.
+      if (!options_.fullPrecision && std::isfinite(value)) parseNumber(formatNumber(value, column.decimals), shown);
+      object[column.name] = shown;
+    }
+    out_ << (rowsWritten_ ? ",\n" : "\n") << object.dump();
+  } else {
+    for (std::size_t i = 0; i < count; ++i) out_ << (i ? "," : "") << csvCell(cells[i], columns_[i]);
+    out_ << '\n';
+  }
+  ++rowsWritten_;
+}
+
+void RowWriter::finish() {
+  if (finished_) return;
+  start();
+  finished_ = true;
+  if (options_.json) out_ << (rowsWritten_ ? "\n]\n" : "]\n");
+  out_.flush();
+}
+
+void reportBadRow(std::size_t lineNumber, const std::string& message) {
+  std::cerr << "svy: line " << lineNumber << ": " << message << '\n';
+}
+
+int runRows(std::istream& in, std::ostream& out, const RowFormat& format, const OutputOptions& options,
+            const RowHandler& handler) {
+  RowReader reader(in, format.inputs, format.numericInput);
+  RowWriter writer(out, format.outputs, options);
+  int status = kExitOk;
+  InputRow row;
+  std::vector<Cell> cells;
+  std::string error;
+  while (reader.next(row)) {
+    if (!fieldCountFits(format, row.fields.size())) {
+      reportBadRow(row.lineNumber, fieldCountMessage(format, row.fields.size()));
+      status = kExitBadRows;
+      continue;
+    }
+    bool numbersOk = true;
+    if (format.numericInput) {
+      row.numbers.resize(row.fields.size());
+      for (std::size_t i = 0; i < row.fields.size() && numbersOk; ++i) {
+        if (!parseNumber(row.fields[i], row.numbers[i])) {
+          reportBadRow(row.lineNumber, format.inputs[i] + ": '" + row.fields[i] + "' is not a number");
+          numbersOk = false;
+        }
+      }
+    }
+    if (!numbersOk) {
+      status = kExitBadRows;
+      continue;
+    }
+    cells.clear();
+    error.clear();
+    if (!handler(row, cells, error)) {
+      reportBadRow(row.lineNumber, error.empty() ? "no result" : error);
+      status = kExitBadRows;
+      continue;
+    }
+    writer.write(cells);
+  }
+  writer.finish();
+  return status;
+}
+
+int runRows(const std::string& inputPath, const RowFormat& format, const OutputOptions& options,
+            const RowHandler& handler) {
+  std::string error;
+  const std::unique_ptr<std::istream> in = openInput(inputPath, error);
+  if (!in) {
+    std::cerr << "svy: " << error << '\n';
+    return kExitUsage;
+  }
+  return runRows(*in, std::cout, format, options, handler);
+}
+
+}  // namespace svy_tool

@@ -1,0 +1,8 @@
+#pragma once
+// One registration function per verb family: each adds its family subcommand ("svy cogo ...") and the verbs
+// under it to the root command. Every family source reads and writes rows through row_io.h.
+
+namespace CLI {
+class App;
+}
+
