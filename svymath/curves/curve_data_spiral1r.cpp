@@ -1,0 +1,310 @@
+#include "svymath/curves/curve_data_spiral1r.h"
+
+#include <cmath>
+
+#include "svymath/curves/spiral_factory.h"
+#include "svymath/curves/spiral_length_range.h"
+#include "svymath/foundation/constants.h"
+#include "svyutils/svy_err_log.h"
+
+using svy_math::tol::kZero;
+
+namespace {
+
+// The kind code of spiral data, shared with the alignment's spiral element.
+constexpr int kSpiralDataType = 2;
+
+// Projection of a point onto the spiral: the element is sampled at this many intervals to find the nearest
+// stretch, which a golden-section search then narrows. 32 intervals keep each stretch short enough (a
+// sixty-fourth of a half turn or less for ordinary spirals) that the distance has one minimum in it.
+constexpr int kProjectionSamples = 32;
+// The golden-section search stops when the bracket is this short (metres); far below a survey millimetre.
+constexpr double kProjectionLengthTol = 1e-10;
+constexpr int kProjectionMaxIterations = 200;
+constexpr double kInvGolden = 0.6180339887498949;  // (sqrt(5) - 1) / 2
+
+// The step search narrows the largest admissible chord to this fraction of the step.
+constexpr double kStepRelTol = 1e-9;
+constexpr int kStepMaxHalvings = 64;
+constexpr int kStepMaxBisections = 64;
+
+void logFailure(int line) { svy_logging::svy_err_log(svy_math::kCurvesLogSource, line, ""); }
+
+// A radius value that stands for the tangent: zero, infinite or undefined.
+bool isTangentRadius(double r) { return !(std::fabs(r) >= kZero) || std::isinf(r); }
+
+}  // namespace
+
+CCurveDataSpiral1R::CCurveDataSpiral1R(AlntMathSpiralType type) : m_law(svy_math::createSpiralLaw(type)) {}
+
+CCurveDataSpiral1R::CCurveDataSpiral1R(const CCurveDataSpiral1R& other)
+    : m_law(other.m_law->clone()), m_isTSSC(other.m_isTSSC), m_flags(other.m_flags) {}
+
+CCurveDataSpiral1R& CCurveDataSpiral1R::operator=(const CCurveDataSpiral1R& other) {
+  if (this != &other) {
+    CCurveSpiralTStoSCBase* law = other.m_law->clone();
+    delete m_law;
+    m_law = law;
+    m_isTSSC = other.m_isTSSC;
+    m_flags = other.m_flags;
+  }
+  return *this;
+}
+
+CCurveDataSpiral1R::~CCurveDataSpiral1R() { delete m_law; }
+
+int CCurveDataSpiral1R::static_type() { return kSpiralDataType; }
+
+void CCurveDataSpiral1R::reset() {
+  m_law->reset();
+  m_isTSSC = true;
+  onDefinitionChanged();
+}
+
+void CCurveDataSpiral1R::resetType(AlntMathSpiralType type) {
+  delete m_law;
+  m_law = svy_math::createSpiralLaw(type);
+  onDefinitionChanged();
+}
+
+bool CCurveDataSpiral1R::recreateSimpleSpiral(AlntMathSpiralType type) {
+  const double length = m_law->getLength();
+  const double radius = m_law->getRadius();
+  const bool lawRight = radius >= 0.0;
+  const bool wasDefined = m_law->isok();
+  resetType(type);
+  if (!wasDefined) return false;
+  const bool ok = m_law->setLenAndR(length, radius, lawRight);
+  onDefinitionChanged();
+  return ok;
+}
+
+bool CCurveDataSpiral1R::setLenAndR(double L, double R, bool toTheRight, bool isTSSC) {
+  const bool ok = m_law->setLenAndR(L, R, isTSSC ? toTheRight : !toTheRight);
+  m_isTSSC = isTSSC;
+  onDefinitionChanged();
+  return ok;
+}
+
+bool CCurveDataSpiral1R::setLenAndSpPrm(double L, double K, bool isTSSC) {
+  const bool ok = m_law->setLenAndSpPrm(L, isTSSC ? K : -K);
+  m_isTSSC = isTSSC;
+  onDefinitionChanged();
+  return ok;
+}
+
+bool CCurveDataSpiral1R::setLenAndTwoR(double L, double R1, double R2, bool toTheRight, bool isTSSC) {
+  const bool tangent1 = isTangentRadius(R1);
+  const bool tangent2 = isTangentRadius(R2);
+  if (tangent1 && tangent2) {
+    m_law->reset();
+    m_isTSSC = isTSSC;
+    onDefinitionChanged();
+    return false;
+  }
+  if (tangent1 || tangent2) return setLenAndR(L, tangent1 ? R2 : R1, toTheRight, isTSSC);
+  const double flat = std::fmax(std::fabs(R1), std::fabs(R2));
+  const double sharp = std::fmin(std::fabs(R1), std::fabs(R2));
+  const bool ok = m_law->setLenAndTwoR(L, flat, sharp, isTSSC ? toTheRight : !toTheRight);
+  if (!ok) m_law->reset();
+  m_isTSSC = isTSSC;
+  onDefinitionChanged();
+  return ok;
+}
+
+bool CCurveDataSpiral1R::setTurnRight(bool toTheRight) {
+  if (!m_law->isok()) return false;
+  const double radius = m_isTSSC ? m_law->getRadius() : -m_law->getRadius();
+  const bool ok = m_law->setLenAndR(m_law->getLength(), radius, m_isTSSC ? toTheRight : !toTheRight);
+  onDefinitionChanged();
+  return ok;
+}
+
+double CCurveDataSpiral1R::getTotalLength() const { return m_law->getLength(); }
+
+double CCurveDataSpiral1R::GetAzimuth(double s) const {
+  if (m_isTSSC) return m_law->GetAzimuth(s);
+  return m_law->GetAzimuth(lawLength(s)) - m_law->getSpiralAngle().getDeg();
+}
+
+bool CCurveDataSpiral1R::fullPosAtLength(double s, double& north, double& east) const {
+  if (m_isTSSC) return m_law->getPosAtLength(s, north, east);
+  double n = 0.0;
+  double e = 0.0;
+  if (!m_law->getPosAtLength(lawLength(s), n, e)) return false;
+  // Curve to tangent: the frame has its origin at the law's end point and its north axis along the law's
+  // end tangent reversed (the direction of travel), east to the right of it.
+  const double dN = n - m_law->getFinalNorthing();
+  const double dE = e - m_law->getFinalEasting();
+  const double cosT = m_law->getSpiralAngle().getCos();
+  const double sinT = m_law->getSpiralAngle().getSin();
+  north = -(dN * cosT + dE * sinT);
+  east = dN * sinT - dE * cosT;
+  return true;
+}
+
+bool CCurveDataSpiral1R::getPosAtLength(double s, double& north, double& east) const {
+  if (!m_law->isok()) {
+    logFailure(__LINE__);
+    return false;
+  }
+  if (!svy_math::snapToRange(s, 0.0, getTotalLength())) {
+    logFailure(__LINE__);
+    return false;
+  }
+  return fullPosAtLength(s, north, east);
+}
+
+double CCurveDataSpiral1R::getCurvatureAtLength(double s) const {
+  if (!m_law->isok()) return 0.0;
+  if (m_isTSSC) return m_law->getCurvatureAtLength(s);
+  return -m_law->getCurvatureAtLength(lawLength(s));
+}
+
+double CCurveDataSpiral1R::fullStepForDeviation(double s, double dev, double limit) const {
+  const double remaining = limit - s;
+  if (!(remaining > 0.0)) return 0.0;
+  // Under a CS-to-ST element the step covers the law backwards, ending at law length L - s.
+  auto fits = [&](double step) {
+    return m_law->checkStepForDeviation(step, m_isTSSC ? s : lawLength(s) - step, dev);
+  };
+  if (fits(remaining)) return remaining;
+  // The chord's deviation grows with the step: halve until it fits, then bisect between fit and misfit.
+  double bad = remaining;
+  double good = 0.5 * remaining;
+  for (int i = 0; i < kStepMaxHalvings && !fits(good); ++i) {
+    bad = good;
+    good *= 0.5;
+  }
+  for (int i = 0; i < kStepMaxBisections && bad - good > kStepRelTol * bad; ++i) {
+    const double mid = 0.5 * (good + bad);
+    if (fits(mid)) {
+      good = mid;
+    } else {
+      bad = mid;
+    }
+  }
+  return good;
+}
+
+double CCurveDataSpiral1R::getStepForDeviation(double s, double dev) const {
+  const double total = getTotalLength();
+  if (!svy_math::snapToRange(s, 0.0, total)) {
+    logFailure(__LINE__);
+    return 0.0;
+  }
+  if (!(dev > 0.0)) return total - s;
+  return fullStepForDeviation(s, dev, total);
+}
+
+bool CCurveDataSpiral1R::getShortestDistAndCurveLen(double north, double east, double& dist,
+                                                    double& len) const {
+  if (!m_law->isok() || std::isnan(north) || std::isnan(east)) return false;
+  const double total = getTotalLength();
+  if (!(total >= 0.0) || std::isinf(total)) return false;
+  auto dist2 = [&](double s) {
+    double n = 0.0;
+    double e = 0.0;
+    if (!getPosAtLength(s, n, e)) return svy_math::undefinedValue();
+    return (north - n) * (north - n) + (east - e) * (east - e);
+  };
+  double bestLen = 0.0;
+  double best = dist2(0.0);
+  for (int k = 1; k <= kProjectionSamples; ++k) {
+    const double s = total * k / kProjectionSamples;
+    const double d = dist2(s);
+    if (d < best) {
+      best = d;
+      bestLen = s;
+    }
+  }
+  if (std::isnan(best)) return false;
+  const double interval = total / kProjectionSamples;
+  double lo = std::fmax(0.0, bestLen - interval);
+  double hi = std::fmin(total, bestLen + interval);
+  double x1 = hi - kInvGolden * (hi - lo);
+  double x2 = lo + kInvGolden * (hi - lo);
+  double d1 = dist2(x1);
+  double d2 = dist2(x2);
+  for (int i = 0; i < kProjectionMaxIterations && hi - lo > kProjectionLengthTol; ++i) {
+    if (d1 < d2) {
+      hi = x2;
+      x2 = x1;
+      d2 = d1;
+      x1 = hi - kInvGolden * (hi - lo);
+      d1 = dist2(x1);
+    } else {
+      lo = x1;
+      x1 = x2;
+      d1 = d2;
+      x2 = lo + kInvGolden * (hi - lo);
+      d2 = dist2(x2);
+    }
+  }
+  const double refined = 0.5 * (lo + hi);
+  const double dRefined = dist2(refined);
+  if (dRefined < best) {
+    best = dRefined;
+    bestLen = refined;
+  }
+  double n = 0.0;
+  double e = 0.0;
+  if (!getPosAtLength(bestLen, n, e)) return false;
+  // Side: the cross product of the direction of travel and the vector to the point.
+  const double az = GetAzimuth(bestLen) * svy_math::units::kDegToRad;
+  const double across = -std::sin(az) * (north - n) + std::cos(az) * (east - e);
+  dist = across < 0.0 ? -std::sqrt(best) : std::sqrt(best);
+  len = bestLen;
+  return true;
+}
+
+double CCurveDataSpiral1R::getFinalNorthing() const {
+  double n = svy_math::undefinedValue();
+  double e = svy_math::undefinedValue();
+  if (m_law->isok()) getPosAtLength(getTotalLength(), n, e);
+  return n;
+}
+
+double CCurveDataSpiral1R::getFinalEasting() const {
+  double n = svy_math::undefinedValue();
+  double e = svy_math::undefinedValue();
+  if (m_law->isok()) getPosAtLength(getTotalLength(), n, e);
+  return e;
+}
+
+bool CCurveDataSpiral1R::getFinalAzimut(CMathAngle& azimuth) const {
+  if (!m_law->isok()) return false;
+  azimuth.setDeg(GetAzimuth(getTotalLength()));
+  return true;
+}
+
+double CCurveDataSpiral1R::getFinalAzimutInRad() const {
+  if (!m_law->isok()) return 0.0;
+  return GetAzimuth(getTotalLength()) * svy_math::units::kDegToRad;
+}
+
+double CCurveDataSpiral1R::getRadius() const { return m_isTSSC ? m_law->getRadius() : -m_law->getRadius(); }
+
+double CCurveDataSpiral1R::getSpiralParam() const {
+  return std::sqrt(std::fabs(m_law->getRadius() * m_law->getLength()));
+}
+
+double CCurveDataSpiral1R::getLengthAtAzimuth(const CMathAngle& angle) const {
+  if (m_isTSSC) return m_law->getLengthAtAzimuth(angle);
+  // Under a CS-to-ST element the direction has turned by angle where the law's direction is theta + angle.
+  return m_law->getLength() - m_law->getLengthAtAzimuth(m_law->getSpiralAngle() + angle);
+}
+
+bool CCurveDataSpiral1R::isToTheRight() const { return getRadius() >= 0.0; }
+
+bool CCurveDataSpiral1R::isToTheLeft() const { return getRadius() <= 0.0; }
+
+bool CCurveDataSpiral1R::GetSpiralElement(double& length, double& radius, bool& toTheRight,
+                                          bool& isTSSC) const {
+  if (!m_law->isok()) return false;
+  length = getTotalLength();
+  radius = getRadius();
+  toTheRight = isToTheRight();
+  isTSSC = m_isTSSC;
+  return true;
+}
