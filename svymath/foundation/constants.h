@@ -59,4 +59,197 @@ inline double undefinedValue() {
 }
 inline bool isUndefined(double x) { return x != x; }
 
+// Coordinate geometry (inverse, radiation, implicit lines, line and circle intersections).
+namespace tol {
+
+// Two coordinate records are the same point for an azimuth when N and E agree within this (metres).
+constexpr double kSamePoint = 1e-10;
+// A 3-D line shorter than this (metres) has no usable direction to extend along.
+constexpr double kMinLineLength3D = 1e-5;
+// A plane vector whose squared length is below this (square metres, i.e. shorter than 1e-8 m) has no
+// direction to rotate.
+constexpr double kVectorLengthSqZero = 1e-16;
+// Radius of a parallel of latitude (metres) below which a point counts as at the pole: no longitude step.
+constexpr double kPoleParallelRadius = 1e-6;
+// Guards against division by an exact or subnormal zero in the implicit-line solvers: twice and three
+// times the smallest normal double. Not geometric tolerances.
+constexpr double kTwoMinNormal = 4.450147717014403e-308;
+constexpr double kThreeMinNormal = 6.675221575521604e-308;
+// Quadratic roots: a discriminant within +-1e-13 is a double root; a leading coefficient below 1e-13
+// leaves a linear equation, which has no root when its slope is below 1e-5.
+constexpr double kDiscriminantZero = 1e-13;
+constexpr double kLeadingCoeffZero = 1e-13;
+constexpr double kLinearCoeffZero = 1e-5;
+// A line or circle that misses or overlaps a circle by at most this (metres) touches it: one solution.
+// Doubles near survey coordinates are up to 1.9e-9 m apart (N 10 000 000), and a tangent constructed
+// there is off by a few such spacings; 1e-8 m recognises it. An overlap this small puts each true crossing
+// up to sqrt(2 R 1e-8) from the touching point (1.4 mm for R = 100 m): the precision to which data
+// rounded at that level defines a touching point anyway.
+constexpr double kTangency = 1e-8;
+
+}  // namespace tol
+
+namespace units {
+
+// Radius of the spherical earth used for small steps in latitude and longitude (metres).
+constexpr double kSphereEarthRadius = 6.371e6;
+// Degrees of latitude per metre on that sphere: 180 / (pi * 6.371e6).
+constexpr double kSphereDegPerMetre = 8.993216059187306e-6;
+
+}  // namespace units
+
+// Sexagesimal splits of angles.
+namespace tol {
+
+// Nudge (minutes of arc) added before truncating the minutes of a degree value, so that 12.5 degrees stored
+// as 12.4999999999 still gives 30 minutes; it can make the minutes 60 just below a whole degree.
+constexpr double kDmsMinuteNudge = 1e-4;
+// A packed D.MMSS seconds field above this is floating noise below the next minute (12.3059999999...) and is
+// carried into the minutes.
+constexpr double kPackedSecondsNoise = 99.99999;
+
+}  // namespace tol
+
+// Angle units and the unit conversions of single values. The conversion factors are fixed double constants
+// applied as written (not recomputed from definitions); some differ in their last digits from the exact ratio
+// and some pairs are not exact inverses of each other. They are kept as they are so that results agree to the
+// last bit with data computed by earlier releases.
+namespace units {
+
+// Angles: degrees in a circle, half circle and right angle; minutes and seconds of arc per degree.
+constexpr double kFullCircleDeg = 360.0;
+constexpr double kHalfCircleDeg = 180.0;
+constexpr double kRightAngleDeg = 90.0;
+constexpr double kArcMinutesPerDegree = 60.0;
+constexpr double kArcSecondsPerDegree = 3600.0;
+// Degrees per grad (400 grads to the circle).
+constexpr double kDegPerGrad = 0.9;
+// Mils per degree and degrees per mil (6400 mils to the circle).
+constexpr double kMilPerDeg = 17.77777777777778;
+constexpr double kDegPerMil = 0.05625;
+// Seconds of arc and centesimal seconds (1e-4 grad) in one grad.
+constexpr double kArcSecondsPerGrad = 3240.0;
+constexpr double kCentesimalSecondsPerGrad = 10000.0;
+
+// Feet: the US survey foot is 1200/3937 m, the international foot 0.3048 m.
+constexpr double kUsFootToMetre = 0.3048006096012192;     // metres per US survey foot
+constexpr double kIntFootToMetre = 0.3048;                // metres per international foot
+constexpr double kMetreToUsFoot = 3.2808333333333333;     // US survey feet per metre
+// Feet per metre used when packing feet-inches-eighths (the US factor ends in 7 there, unlike above).
+constexpr double kMetreToUsFootPacked = 3.2808333333333337;
+constexpr double kMetreToIntFootPacked = 3.280839895013123;
+// Feet, inches and eighths of an inch.
+constexpr double kInchesPerFoot = 12.0;
+constexpr double kEighthsPerInch = 8.0;
+constexpr double kEighthsPerFoot = 96.0;
+
+// Gunter's chain (66 ft): chains per metre and metres per chain, US survey and international.
+constexpr double kMetreToUsChain = 0.04970959595959596;
+constexpr double kMetreToIntChain = 0.049709695378986715;
+constexpr double kUsChainToMetre = 20.116840233680467;
+constexpr double kIntChainToMetre = 20.1168;
+// Areas: square feet and square chains per square metre, square metres and acres per square chain.
+constexpr double kSqMetreToUsSqFoot = 10.76386736111111;
+constexpr double kSqMetreToIntSqFoot = 10.76391041670972;
+constexpr double kSqMetreToUsSqChain = 0.002471043930466279;
+constexpr double kSqMetreToIntSqChain = 0.002471053814671653;
+constexpr double kUsSqChainToSqMetre = 404.6872609874252;
+constexpr double kIntSqChainToSqMetre = 404.68564224000005;
+constexpr double kUsSqChainToAcre = 0.1000004000012;
+constexpr double kIntSqChainToAcre = 0.1;
+// Volumes: cubic yards, cubic feet and cubic chains per cubic metre.
+constexpr double kCuMetreToUsCuYard = 1.3079427716263718;
+constexpr double kCuMetreToIntCuYard = 1.3079506193143915;
+constexpr double kCuMetreToUsCuFoot = 35.31445483391203;
+constexpr double kCuMetreToIntCuFoot = 35.31466672148858;
+constexpr double kCuMetreToUsCuChain = 0.00012283459538189068;
+constexpr double kCuMetreToIntCuChain = 0.00012283533239241097;
+
+// Pressure: millimetres of mercury per hectopascal and back; inches of mercury per hectopascal and back
+// (the inch pair is two independently rounded factors whose product is not 1).
+constexpr double kHpaToMmHg = 0.7500615758456564;
+constexpr double kMmHgToHpa = 1.33322387415;
+constexpr double kHpaToInHg = 0.02953;
+constexpr double kInHgToHpa = 33.8639;
+// Temperature: degrees Fahrenheit per degree Celsius and the Fahrenheit reading of 0 degrees Celsius.
+constexpr double kFahrenheitPerCelsius = 1.8;
+constexpr double kFahrenheitAtZeroCelsius = 32.0;
+
+}  // namespace units
+
+// Matrices, covariance and least squares.
+namespace tol {
+
+// A symmetric 3x3 coordinate covariance (square metres) whose determinant is below this has no inverse.
+// Variances of 1e-14 m^2 (0.1 micrometre standard deviations) still give determinants of 1e-42 and above,
+// so only covariances that are singular in substance are refused.
+constexpr double kCovDeterminantZero = 1e-40;
+// A packed symmetric 3x3 matrix with |determinant| below this is singular for InvertSMatr3.
+constexpr double kPackedDeterminantZero = 1e-60;
+// Elements of a packed matrix within +-1e-15 are structural zeros to the Cholesky test and are skipped.
+constexpr double kCholeskySparseZero = 1e-15;
+// Relative precision of the Jacobi eigenvalue sweeps: rotations stop once every off-diagonal element is
+// below 1e-12 of the matrix's off-diagonal norm (divided by the order).
+constexpr double kJacobiRange = 1e-12;
+// A Cholesky pivot of a normal matrix at or below this fraction of its original diagonal element marks the
+// matrix as singular: the unknown is (to 14 digits) a combination of the earlier ones. For a line
+// n = m e + b the ratio is var(e) / mean(e^2), so at E 500 000 eastings with a standard deviation above
+// 5 cm still pass.
+constexpr double kPivotRelativeZero = 1e-14;
+// Eigenvalues of a symmetric matrix at or below this fraction of the largest (in absolute value) are
+// zero to the pseudo-inverse.
+constexpr double kPseudoInverseRelativeZero = 1e-12;
+
+}  // namespace tol
+
+namespace limits {
+
+// Sweeps of the Jacobi method at one threshold. Each sweep with rotations removes at least the square of
+// the threshold from the off-diagonal norm and 3x3 covariances need 2 to 4; the cap only ends sweeps that
+// make no progress (values at the edge of the double range).
+constexpr int kJacobiSweepCap = 100;
+// Gauss-Newton iterations of one solve. Well-posed fits (circle, radius) converge in 3 to 10; the cap,
+// a hundred times that, only ends a problem whose convergence criteria can never be met.
+constexpr int kGaussNewtonIterationCap = 1000;
+
+}  // namespace limits
+
+// Circular-curve formulas (radius, deflection, degree of curve, tangent, external, middle ordinate).
+namespace tol {
+
+// A radius below this (metres) defines no curve: degree of curve, deflection from length and spiral length
+// give 0 for it.
+constexpr double kCurveRadiusZero = 1e-05;
+// A degree of curve below this (radians, 5e-7 degrees: a radius beyond 11 000 km) defines no curve.
+constexpr double kDegOfCurveZeroRad = 8.726646259971647e-09;
+// A deflection within this of a half turn (degrees) has an infinite tangent and external distance.
+constexpr double kHalfTurnDeg = 1e-05;
+
+}  // namespace tol
+
+namespace units {
+
+// Degree of curve on a 100 m (or 100 ft) base: arc definition R = 100 / D_rad, chord definition
+// R = 50 / sin(D_rad / 2); 100 * (180 / pi) is the radius of a curve of one degree (arc definition).
+constexpr double kDegOfCurveBase = 100.0;
+constexpr double kDegOfCurveHalfBase = 50.0;
+constexpr double kRadiusOfOneDegreeCurve = 5729.5779513082325;
+
+}  // namespace units
+
+// Curve elements: chord steps, foot-point searches, undefined arcs.
+namespace tol {
+
+// No chord step along an arc turns the direction by more than a sixteenth of a half turn (pi/16 rad): the
+// chord of such a step stays within 2% of the arc length, so stepping never skips a bend.
+constexpr double kMaxChordStepTurn = 0.19634954084936207;
+// A foot-point search on a curve stops when the length moves by less than this (metres): a thousandth of
+// a micrometre, far below survey precision but well above the rounding of lengths of a few kilometres.
+constexpr double kProjectionLength = 1e-9;
+// Radius returned (and cached) for an arc record that knows neither its radius nor its length (metres):
+// deliberately tiny but not zero, so that divisions by it stay finite.
+constexpr double kUndefinedArcRadius = 1e-6;
+
+}  // namespace tol
+
 }  // namespace svy_math

@@ -103,7 +103,9 @@ class SVYMATH_API CMathAngle {
   // The angle from the ray vertex->p1 to the ray vertex->p3 (clockwise positive); false when either ray
   // has no direction.
   bool setAngle(const C2dPos& p1, const C2dPos& vertex, const C2dPos& p3);
-  // The angle subtended at the centre by a chord c of a circle of radius R.
+  // 2 atan2(sqrt(R^2 - (c/2)^2), c/2): twice the angle between a chord c and the radius R at either of its
+  // ends, which is pi minus the angle the chord subtends at the centre. Unset when the chord exceeds the
+  // diameter.
   void setChordAndR(double chord, double radius);
   // The included angle of a polyline bulge: 4 atan(b), reduced. False only when b is NaN.
   bool setBulge(double bulge);
