@@ -2,7 +2,6 @@
 
 #include <charconv>
 #include <cmath>
-#include <cstdlib>
 #include <system_error>
 
 namespace svy {
@@ -27,8 +26,11 @@ TDecimal shortestDecimal(double value) {
   for (; p != written.ptr && *p != 'e'; ++p) {
     if (*p != '.') number.digits += *p;
   }
-  const long long exponent = std::strtoll(p + 1, nullptr, 10);
-  number.pointPos = exponent + 1;
+  // The exponent follows 'e' with its sign; the buffer has no terminating zero.
+  const bool negativeExponent = p + 1 != written.ptr && p[1] == '-';
+  long long exponent = 0;
+  std::from_chars(p + 2, written.ptr, exponent);
+  number.pointPos = (negativeExponent ? -exponent : exponent) + 1;
   while (!number.digits.empty() && number.digits.back() == '0') number.digits.pop_back();
   return number;
 }
@@ -39,6 +41,7 @@ void roundDecimal(TDecimal& number, int decimals) {
   if (keep >= count) return;
   if (keep < 0 || (keep == 0 && number.digits[0] < '5')) {
     number.digits.clear();
+    number.pointPos = 0;
     return;
   }
   const bool up = number.digits[static_cast<std::size_t>(keep)] >= '5';

@@ -1,0 +1,121 @@
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <map>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "svyutils/svy_err_log.h"
+
+namespace {
+
+using svy_logging::CScopedErrLogCapture;
+using svy_logging::svy_err_log;
+
+TEST(ErrLogCapture, RecordsFileLineAndMessage) {
+  const CScopedErrLogCapture capture;
+  svy_err_log("mathCurves", 120, "");
+  svy_err_log("AreaMath", 7, "segment order");
+  svy_err_log(nullptr, -1, nullptr);
+  const auto entries = capture.entries();
+  ASSERT_EQ(entries.size(), 3U);
+  EXPECT_EQ(entries[0].file, "mathCurves");
+  EXPECT_EQ(entries[0].line, 120);
+  EXPECT_EQ(entries[0].message, "");
+  EXPECT_EQ(entries[1].file, "AreaMath");
+  EXPECT_EQ(entries[1].message, "segment order");
+  EXPECT_EQ(entries[2].file, "");
+  EXPECT_EQ(entries[2].line, -1);
+}
+
+TEST(ErrLogCapture, NestedCapturesRestoreTheOuterOne) {
+  const CScopedErrLogCapture outer;
+  svy_err_log("outer", 1, "");
+  {
+    const CScopedErrLogCapture inner;
+    svy_err_log("inner", 2, "");
+    EXPECT_EQ(inner.count(), 1U);
+  }
+  svy_err_log("outer", 3, "");
+  const auto entries = outer.entries();
+  ASSERT_EQ(entries.size(), 2U);
+  EXPECT_EQ(entries[0].line, 1);
+  EXPECT_EQ(entries[1].line, 3);
+}
+
+TEST(ErrLogSink, InstallReturnsThePreviousSinkAndEmptyRemovesIt) {
+  int calls = 0;
+  const auto original = svy_logging::setErrLogSink([&calls](const svy_logging::TErrLogEntry&) { ++calls; });
+  svy_err_log("formats", 1, "");
+  auto mine = svy_logging::setErrLogSink({});
+  svy_err_log("formats", 2, "");  // no sink: dropped
+  EXPECT_EQ(calls, 1);
+  ASSERT_TRUE(static_cast<bool>(mine));
+  mine(svy_logging::TErrLogEntry{});
+  EXPECT_EQ(calls, 2);
+  svy_logging::setErrLogSink(original);
+}
+
+TEST(ErrLogSink, ASinkMayLogWithoutDeadlock) {
+  const CScopedErrLogCapture capture;
+  std::vector<int> lines;
+  const auto previous = svy_logging::setErrLogSink([&lines](const svy_logging::TErrLogEntry& entry) {
+    lines.push_back(entry.line);
+    if (entry.line > 0) svy_err_log(entry.file.c_str(), entry.line - 1, "");
+  });
+  svy_err_log("chain", 3, "");  // the sink is called outside the log's lock, so it may log again
+  svy_logging::setErrLogSink(previous);
+  EXPECT_EQ(lines, (std::vector<int>{3, 2, 1, 0}));
+  svy_err_log("after", 9, "");
+  ASSERT_EQ(capture.count(), 1U);
+  EXPECT_EQ(capture.entries()[0].file, "after");
+}
+
+// Entries from several threads all arrive, intact, while another thread swaps captures in and out.
+TEST(ErrLogCapture, CollectsEveryEntryFromSeveralThreads) {
+  constexpr int kThreads = 6;
+  constexpr int kPerThread = 2000;
+  const CScopedErrLogCapture capture;
+  std::atomic<bool> go{false};
+  std::vector<std::thread> loggers;
+  for (int t = 0; t < kThreads; ++t) {
+    loggers.emplace_back([t, &go] {
+      const std::string file = "thread" + std::to_string(t);
+      while (!go.load()) std::this_thread::yield();
+      for (int i = 0; i < kPerThread; ++i) svy_err_log(file.c_str(), i, "x");
+    });
+  }
+  go = true;
+  for (auto& logger : loggers) logger.join();
+
+  const auto entries = capture.entries();
+  ASSERT_EQ(entries.size(), static_cast<std::size_t>(kThreads * kPerThread));
+  // Per thread, the lines arrive complete and in the order that thread logged them.
+  std::map<std::string, int> nextLine;
+  for (const auto& entry : entries) {
+    ASSERT_EQ(entry.message, "x");
+    ASSERT_EQ(entry.line, nextLine[entry.file]++) << entry.file;
+  }
+  EXPECT_EQ(nextLine.size(), static_cast<std::size_t>(kThreads));
+}
+
+TEST(ErrLogCapture, SurvivesCapturesEndingWhileOthersLog) {
+  std::atomic<bool> stop{false};
+  std::atomic<long> logged{0};
+  std::thread logger([&] {
+    while (!stop.load()) {
+      svy_err_log("busy", 1, "");
+      ++logged;
+    }
+  });
+  for (int i = 0; i < 200; ++i) {
+    const CScopedErrLogCapture capture;
+    std::this_thread::yield();
+  }
+  stop = true;
+  logger.join();
+  EXPECT_GT(logged.load(), 0);
+}
+
+}  // namespace

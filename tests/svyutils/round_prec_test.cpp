@@ -1,0 +1,84 @@
+#include <gtest/gtest.h>
+
+#include <climits>
+#include <cmath>
+#include <cstdint>
+#include <limits>
+#include <random>
+
+#include "svyutils/round_prec.h"
+
+namespace {
+
+using svy::math::round_prec;
+
+struct TRoundCase {
+  double value;
+  int decimals;
+  double expected;
+};
+
+class RoundPrecTable : public ::testing::TestWithParam<TRoundCase> {};
+
+TEST_P(RoundPrecTable, RoundsHalfAwayFromZero) {
+  const TRoundCase& c = GetParam();
+  EXPECT_EQ(round_prec(c.value, c.decimals), c.expected);
+}
+
+constexpr double kMax = std::numeric_limits<double>::max();
+constexpr double kDenormMin = std::numeric_limits<double>::denorm_min();
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, RoundPrecTable,
+    ::testing::Values(
+        // Binary neighbours just below the written half still round up, as written.
+        TRoundCase{2.675, 2, 2.68}, TRoundCase{-2.675, 2, -2.68}, TRoundCase{1.005, 2, 1.01},
+        TRoundCase{1.0049999, 2, 1.0}, TRoundCase{0.125, 2, 0.13}, TRoundCase{-0.125, 2, -0.13},
+        TRoundCase{2.5, 0, 3.0}, TRoundCase{-2.5, 0, -3.0}, TRoundCase{9.995, 2, 10.0},
+        TRoundCase{999.9995, 3, 1000.0}, TRoundCase{0.0049, 2, 0.0}, TRoundCase{0.005, 2, 0.01},
+        TRoundCase{0.0005, 2, 0.0}, TRoundCase{1234.5, -2, 1200.0}, TRoundCase{1250.0, -2, 1300.0},
+        TRoundCase{-1250.0, -2, -1300.0}, TRoundCase{49.0, -2, 0.0}, TRoundCase{50.0, -2, 100.0},
+        TRoundCase{0.1 + 0.2, 15, 0.3}, TRoundCase{1e300, 2, 1e300}, TRoundCase{1.5e300, -300, 2e300},
+        TRoundCase{kMax, 2, kMax}, TRoundCase{kMax, -293, kMax},  // the carry would pass the largest double
+        TRoundCase{kDenormMin, 2, 0.0}, TRoundCase{kDenormMin, 400, kDenormMin},
+        TRoundCase{123.456, INT_MAX, 123.456}, TRoundCase{123.456, INT_MIN, 0.0}, TRoundCase{0.0, 3, 0.0}));
+
+TEST(RoundPrec, SpecialValuesPassThrough) {
+  EXPECT_TRUE(std::isnan(round_prec(std::numeric_limits<double>::quiet_NaN(), 2)));
+  EXPECT_EQ(round_prec(std::numeric_limits<double>::infinity(), 2), std::numeric_limits<double>::infinity());
+  EXPECT_EQ(round_prec(-std::numeric_limits<double>::infinity(), -3), -std::numeric_limits<double>::infinity());
+  EXPECT_TRUE(std::signbit(round_prec(-0.0, 2)));
+  EXPECT_TRUE(std::signbit(round_prec(-0.001, 2)));  // the sign of a value rounded to zero is kept
+}
+
+// Oracle in integer arithmetic: n thousandths rounded half away from zero to hundredths is
+// (n +- 5) / 10 hundredths, and the nearest double of both decimals is a correctly rounded division.
+TEST(RoundPrec, MatchesIntegerRoundingOfThousandths) {
+  std::mt19937_64 random(7);
+  std::uniform_int_distribution<std::int64_t> thousandths(-9'000'000'000'000LL, 9'000'000'000'000LL);
+  for (int i = 0; i < 20000; ++i) {
+    const std::int64_t n = i < 2000 ? i - 1000 : thousandths(random);
+    const std::int64_t hundredths = (n + (n < 0 ? -5 : 5)) / 10;
+    const double value = static_cast<double>(n) / 1000.0;
+    const double expected = static_cast<double>(hundredths) / 100.0;
+    ASSERT_EQ(round_prec(value, 2), expected) << n;
+  }
+}
+
+// Rounding is idempotent and never moves a value by more than half a unit of the kept decimal
+// (plus the representation error of the result).
+TEST(RoundPrec, IdempotentAndWithinHalfAUnit) {
+  std::mt19937_64 random(11);
+  std::uniform_real_distribution<double> value(-1e6, 1e6);
+  for (int i = 0; i < 5000; ++i) {
+    const double x = value(random);
+    for (int decimals = -3; decimals <= 9; decimals += 3) {
+      const double r = round_prec(x, decimals);
+      EXPECT_EQ(round_prec(r, decimals), r);
+      const double unit = std::pow(10.0, -decimals);
+      EXPECT_LE(std::fabs(r - x), 0.5 * unit + 1e-9 * std::fabs(x));
+    }
+  }
+}
+
+}  // namespace

@@ -1,0 +1,207 @@
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "svyutils/svy_string.h"
+
+namespace {
+
+using svy_text::CSvyString;
+using svy_text::kCodePageCLocale;
+using svy_text::kCodePageUtf8;
+
+struct TUtf8Case {
+  const char* utf8;
+  std::wstring wide;
+};
+
+class SvyStringUtf8 : public ::testing::TestWithParam<TUtf8Case> {};
+
+TEST_P(SvyStringUtf8, DecodesAndEncodesBack) {
+  const TUtf8Case& c = GetParam();
+  const CSvyString text(c.utf8, kCodePageUtf8);
+  EXPECT_EQ(text.str(), c.wide);
+  EXPECT_EQ(text.ToNarrow(kCodePageUtf8), std::string(c.utf8));
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    WellFormed, SvyStringUtf8,
+    ::testing::Values(TUtf8Case{"", L""}, TUtf8Case{"N 12.5", L"N 12.5"},
+                      TUtf8Case{"45\xC2\xB0" "30'", L"45\u00B030'"},          // degree sign, 2 bytes
+                      TUtf8Case{"\xE2\x82\xAC 5", L"\u20AC 5"},               // euro sign, 3 bytes
+                      TUtf8Case{"\xF0\x9D\x84\x9E", std::wstring(L"\U0001D11E")}));  // 4 bytes
+
+TEST(SvyStringUtf8Malformed, BecomesReplacementCharacterAndContinues) {
+  struct {
+    const char* bytes;
+    std::wstring expected;
+  } const cases[] = {
+      {"a\x80" "b", L"a\uFFFDb"},             // stray continuation byte
+      {"a\xC3", L"a\uFFFD"},                  // truncated at the end of the text
+      {"\xC0\xAF", L"\uFFFD\uFFFD"},          // overlong '/'
+      {"\xED\xA0\x80", L"\uFFFD\uFFFD\uFFFD"},  // encoded surrogate
+      {"\xF4\x90\x80\x80", L"\uFFFD\uFFFD\uFFFD\uFFFD"},  // beyond U+10FFFF
+      {"\xFF" "x", L"\uFFFDx"},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.bytes);
+    EXPECT_EQ(CSvyString(c.bytes, kCodePageUtf8).str(), c.expected);
+  }
+}
+
+TEST(SvyStringCLocale, MapsEveryByteToTheSameCodePoint) {
+  std::string bytes;
+  for (int b = 1; b < 256; ++b) bytes += static_cast<char>(b);
+  const CSvyString text(bytes.c_str(), kCodePageCLocale);
+  ASSERT_EQ(text.GetLength(), 255);
+  for (int i = 0; i < 255; ++i) EXPECT_EQ(static_cast<int>(text.GetAt(i)), i + 1);
+  EXPECT_EQ(text.ToNarrow(kCodePageCLocale), bytes);
+  EXPECT_EQ(CSvyString(L"a\u20ACb").ToNarrow(kCodePageCLocale), "a?b");
+}
+
+TEST(SvyStringSearch, FindsAndReportsMinusOne) {
+  const CSvyString text(L"12+345.67+8");
+  EXPECT_EQ(text.Find(L'+'), 2);
+  EXPECT_EQ(text.Find(L'+', 3), 9);
+  EXPECT_EQ(text.Find(L'+', 10), -1);
+  EXPECT_EQ(text.Find(L'+', -1), -1);
+  EXPECT_EQ(text.Find(L"45"), 4);
+  EXPECT_EQ(text.Find(L"45", 5), -1);
+  EXPECT_EQ(text.Find(L"", 11), 11);
+  EXPECT_EQ(text.Find(L"x", 99), -1);
+  EXPECT_EQ(text.ReverseFind(L'+'), 9);
+  EXPECT_EQ(text.FindOneOf(L".+"), 2);
+  EXPECT_EQ(text.FindOneOf(L"xyz"), -1);
+  EXPECT_EQ(text.FindOneOf(L""), -1);
+}
+
+TEST(SvyStringSubstrings, ClampToTheText) {
+  const CSvyString text(L"abcdef");
+  struct {
+    CSvyString actual;
+    const wchar_t* expected;
+  } const cases[] = {
+      {text.Mid(2), L"cdef"},     {text.Mid(2, 2), L"cd"},     {text.Mid(-3, 2), L"ab"},
+      {text.Mid(4, 99), L"ef"},   {text.Mid(9), L""},          {text.Mid(1, -1), L""},
+      {text.Left(2), L"ab"},      {text.Left(-1), L""},        {text.Left(99), L"abcdef"},
+      {text.Right(2), L"ef"},     {text.Right(-1), L""},       {text.Right(99), L"abcdef"},
+  };
+  for (const auto& c : cases) EXPECT_EQ(c.actual.str(), c.expected);
+}
+
+TEST(SvyStringEditing, TrimsReplacesInsertsAndDeletes) {
+  CSvyString text(L" \t 1,5 \r\n");
+  EXPECT_EQ(CSvyString(text).TrimLeft().str(), L"1,5 \r\n");
+  EXPECT_EQ(CSvyString(text).TrimRight().str(), L" \t 1,5");
+  EXPECT_EQ(text.Trim().str(), L"1,5");
+  EXPECT_EQ(CSvyString(L"   ").Trim().str(), L"");
+  EXPECT_EQ(CSvyString(L"xxabxx").TrimLeft(L'x').TrimRight(L"x").str(), L"ab");
+
+  EXPECT_EQ(text.Replace(L',', L'.'), 1);
+  EXPECT_EQ(text.str(), L"1.5");
+  // A replacement that contains the searched text must not be searched again.
+  CSvyString grow(L"a-a-a");
+  EXPECT_EQ(grow.Replace(L"a", L"aa"), 3);
+  EXPECT_EQ(grow.str(), L"aa-aa-aa");
+  EXPECT_EQ(grow.Replace(L"aa", nullptr), 3);
+  EXPECT_EQ(grow.str(), L"--");
+  EXPECT_EQ(grow.Replace(L"", L"x"), 0);
+
+  CSvyString edit(L"1234");
+  EXPECT_EQ(edit.Insert(1, L'+'), 5);
+  EXPECT_EQ(edit.Insert(99, L".00"), 8);
+  EXPECT_EQ(edit.Insert(-5, L"-"), 9);
+  EXPECT_EQ(edit.str(), L"-1+234.00");
+  EXPECT_EQ(edit.Delete(0), 8);
+  EXPECT_EQ(edit.Delete(5, 99), 5);
+  EXPECT_EQ(edit.Delete(99, 1), 5);
+  EXPECT_EQ(edit.Delete(-1, 1), 5);
+  EXPECT_EQ(edit.str(), L"1+234");
+  EXPECT_EQ(edit.Remove(L'+'), 1);
+  EXPECT_EQ(edit.str(), L"1234");
+
+  edit.SetAt(0, L'9');
+  edit.SetAt(4, L'x');
+  edit.SetAt(-1, L'x');
+  EXPECT_EQ(edit.str(), L"9234");
+  EXPECT_EQ(edit.GetAt(4), L'\0');
+  EXPECT_EQ(edit[3], L'4');
+}
+
+TEST(SvyStringCompare, OrdinalAndCaseFolded) {
+  struct {
+    const wchar_t* a;
+    const wchar_t* b;
+    int ordinal;
+    int noCase;
+  } const cases[] = {
+      {L"abc", L"abc", 0, 0},   {L"abc", L"ABC", 1, 0},      {L"abc", L"abd", -1, -1},
+      {L"ab", L"abc", -1, -1},  {L"abc", L"AB", 1, 1},       {L"", L"", 0, 0},
+      {L"\u00C9t\u00C9", L"\u00E9T\u00E9", -1, 0},        // Latin-1 letters fold too
+      {L"\u00D7", L"\u00F7", -1, -1},                      // the signs are no letters
+      {L"360", L"360", 0, 0},   {L" 45", L"360", -1, -1},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(::testing::Message() << "case " << (&c - cases));
+    const int ordinal = CSvyString(c.a).Compare(c.b);
+    const int noCase = CSvyString(c.a).CompareNoCase(c.b);
+    EXPECT_EQ((ordinal > 0) - (ordinal < 0), c.ordinal);
+    EXPECT_EQ((noCase > 0) - (noCase < 0), c.noCase);
+  }
+  EXPECT_EQ(CSvyString(L"Ab\u00E9").MakeUpper().str(), L"AB\u00C9");
+  EXPECT_EQ(CSvyString(L"Ab\u00C9").MakeLower().str(), L"ab\u00E9");
+}
+
+TEST(SvyStringBuffer, WritesThroughAndSetsTheLength) {
+  CSvyString text(L"ab");
+  wchar_t* buffer = text.GetBuffer(10);
+  ASSERT_NE(buffer, nullptr);
+  const wchar_t written[] = L"12.345";
+  for (int i = 0; i <= 6; ++i) buffer[i] = written[i];
+  text.ReleaseBuffer();
+  EXPECT_EQ(text.str(), L"12.345");
+  text.GetBuffer(3);
+  text.ReleaseBuffer(2);
+  EXPECT_EQ(text.str(), L"12");
+  // A buffer request below the length keeps the text.
+  text.GetBuffer(0);
+  text.ReleaseBuffer();
+  EXPECT_EQ(text.str(), L"12");
+}
+
+TEST(SvyStringFormat, PrintfConversionsWithWideStrings) {
+  struct {
+    CSvyString actual;
+    const wchar_t* expected;
+  } cases[] = {{{}, L"1+234.57"}, {{}, L"[  abc|x|nar]"}, {{}, L"100% -7 0x1f"}, {{}, L"5.30e+00"}};
+  cases[0].actual.Format(L"%d+%.2f", 1, 234.567);
+  cases[1].actual.Format(L"[%5s|%c|%hs]", L"abc", L'x', "nar");
+  cases[2].actual.Format(L"%d%% %ld %#x", 100, -7L, 31U);
+  cases[3].actual.Format(L"%.2e", 5.3);
+  for (const auto& c : cases) EXPECT_EQ(c.actual.str(), c.expected);
+
+  CSvyString appended(L"N=");
+  appended.AppendFormat(L"%.3f", 12.0);
+  EXPECT_EQ(appended.str(), L"N=12.000");
+}
+
+TEST(SvyStringFormat, GrowsForLongOutput) {
+  const std::wstring longText(5000, L'z');
+  CSvyString text;
+  text.Format(L"<%ls>%d", longText.c_str(), 42);
+  EXPECT_EQ(text.str(), L"<" + longText + L">42");
+}
+
+TEST(SvyStringOperators, ConcatenateAndCompare) {
+  CSvyString text = CSvyString(L"1") + L"+" + CSvyString("234", svy_text::kCodePageUtf8) + L'.';
+  text += L"5";
+  EXPECT_TRUE(text == L"1+234.5");
+  EXPECT_TRUE(text != CSvyString(L"1+234.50"));
+  EXPECT_TRUE(CSvyString(L"a") < CSvyString(L"b"));
+  text = static_cast<const wchar_t*>(nullptr);
+  EXPECT_TRUE(text.IsEmpty());
+  EXPECT_EQ(CSvyString(L'-', 3).str(), L"---");
+  EXPECT_EQ(CSvyString(L"abcdef", 3).str(), L"abc");
+}
+
+}  // namespace
