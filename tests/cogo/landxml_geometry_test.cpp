@@ -1,0 +1,184 @@
+// Published alignment geometry as an oracle: the straight and circular elements of the LandXML files in
+// the shared reference folder (optional: skipped when the folder is absent). Every line's direction and
+// length must come out of Inverse2D and lead back to its end through Radiate2D; every arc's centre must be
+// a crossing of the circles about its ends, on the side its turn says, and its start tangent must touch
+// its circle at the start.
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <string>
+#include <vector>
+
+#include "support/refdata.h"
+#include "svymath/cogo/circle_solvers.h"
+#include "svymath/cogo/inverse_radiate.h"
+#include "svymath/foundation/constants.h"
+
+namespace {
+
+using svy_math::units::kPi;
+
+struct Element {
+  std::string file;
+  std::string tag;
+  std::string head;  // the opening tag with its attributes
+  std::string body;
+};
+
+std::string readFile(const std::filesystem::path& path) {
+  std::ifstream in(path, std::ios::binary);
+  std::ostringstream text;
+  text << in.rdbuf();
+  return text.str();
+}
+
+// The value of attribute `name` in an opening tag, or NaN when it is absent or not a number.
+double attribute(const std::string& head, const std::string& name) {
+  const std::string key = " " + name + "=\"";
+  const std::size_t at = head.find(key);
+  if (at == std::string::npos) return std::nan("");
+  try {
+    return std::stod(head.substr(at + key.size()));
+  } catch (...) {
+    return std::nan("");
+  }
+}
+
+std::string textAttribute(const std::string& head, const std::string& name) {
+  const std::string key = " " + name + "=\"";
+  const std::size_t at = head.find(key);
+  if (at == std::string::npos) return std::string();
+  const std::size_t end = head.find('"', at + key.size());
+  return head.substr(at + key.size(), end - at - key.size());
+}
+
+// "<Start>N E [Z]</Start>" inside an element.
+bool childPos(const std::string& body, const std::string& child, C2dPos& pos) {
+  const std::size_t at = body.find("<" + child + ">");
+  if (at == std::string::npos) return false;
+  std::istringstream numbers(body.substr(at + child.size() + 2));
+  return static_cast<bool>(numbers >> pos.north() >> pos.east());
+}
+
+// Radians per unit of the file's directionUnit; NaN when the file gives none.
+double radiansPerDirectionUnit(const std::string& text) {
+  const std::string unit = textAttribute(text, "directionUnit");
+  if (unit == "grads") return kPi / 200.0;
+  if (unit == "decimal degrees") return kPi / 180.0;
+  if (unit == "radians") return 1.0;
+  return std::nan("");
+}
+
+struct Collected {
+  std::vector<Element> elements;
+  std::vector<double> radiansPerUnit;  // per element, from its file
+};
+
+Collected collect(const std::string& tag) {
+  Collected out;
+  const std::filesystem::path root = svy_test::refdataPath("alignment/ifc-infra-unit-test");
+  for (const auto& entry : std::filesystem::recursive_directory_iterator(root)) {
+    std::string ext = entry.path().extension().string();
+    for (char& ch : ext) ch = static_cast<char>(std::tolower(static_cast<unsigned char>(ch)));
+    if (ext != ".xml") continue;
+    const std::string text = readFile(entry.path());
+    const double perUnit = radiansPerDirectionUnit(text);
+    std::size_t at = 0;
+    while ((at = text.find("<" + tag + " ", at)) != std::string::npos) {
+      const std::size_t headEnd = text.find('>', at);
+      const std::size_t close = text.find("</" + tag + ">", headEnd);
+      if (headEnd == std::string::npos || close == std::string::npos) break;
+      out.elements.push_back(Element{entry.path().filename().string(), tag, text.substr(at, headEnd - at),
+                                     text.substr(headEnd + 1, close - headEnd - 1)});
+      out.radiansPerUnit.push_back(perUnit);
+      at = close;
+    }
+  }
+  return out;
+}
+
+// Coordinates are published to 1e-6 of the length unit (some to more digits); allow a few units of that.
+constexpr double kPublishedPos = 5e-6;
+
+TEST(LandXmlLines, InverseGivesThePublishedDirectionAndLength) {
+  SVY_SKIP_WITHOUT_REFDATA();
+  const Collected lines = collect("Line");
+  ASSERT_GE(lines.elements.size(), 5u);
+  for (std::size_t i = 0; i < lines.elements.size(); ++i) {
+    const Element& line = lines.elements[i];
+    SCOPED_TRACE(line.file + ": " + line.head);
+    C2dPos start, end;
+    ASSERT_TRUE(childPos(line.body, "Start", start));
+    ASSERT_TRUE(childPos(line.body, "End", end));
+    double azimuth = 0, distance = 0;
+    ASSERT_TRUE(Inverse2D(start.east(), start.north(), end.east(), end.north(), azimuth, distance));
+    EXPECT_NEAR(distance, attribute(line.head, "length"), kPublishedPos);
+    const double published = attribute(line.head, "dir") * lines.radiansPerUnit[i];
+    if (!std::isnan(published)) {
+      EXPECT_NEAR(std::remainder(azimuth - published, 2 * kPi), 0.0, kPublishedPos / distance + 1e-9);
+      double e = 0, n = 0;
+      Radiate2D(start.east(), start.north(), published, attribute(line.head, "length"), e, n);
+      EXPECT_NEAR(n, end.north(), kPublishedPos);
+      EXPECT_NEAR(e, end.east(), kPublishedPos);
+    }
+  }
+}
+
+TEST(LandXmlArcs, CentreIsTheCrossingOfTheCirclesAboutStartAndEndOnTheTurnSide) {
+  SVY_SKIP_WITHOUT_REFDATA();
+  const Collected arcs = collect("Curve");
+  ASSERT_GE(arcs.elements.size(), 5u);
+  for (const Element& arc : arcs.elements) {
+    SCOPED_TRACE(arc.file + ": " + arc.head);
+    C2dPos start, center, end;
+    ASSERT_TRUE(childPos(arc.body, "Start", start));
+    ASSERT_TRUE(childPos(arc.body, "Center", center));
+    ASSERT_TRUE(childPos(arc.body, "End", end));
+    const double rStart = std::hypot(start.north() - center.north(), start.east() - center.east());
+    const double rEnd = std::hypot(end.north() - center.north(), end.east() - center.east());
+    C2dPos right, left;
+    ASSERT_EQ(IntersectionCoordsOfTwoCircles(start, rStart, end, rEnd, right, left), 2);
+    // A clockwise (right-turning) arc has its centre right of the chord start -> end.
+    const C2dPos& found = textAttribute(arc.head, "rot") == "cw" ? right : left;
+    EXPECT_NEAR(found.north(), center.north(), 1e-8);
+    EXPECT_NEAR(found.east(), center.east(), 1e-8);
+  }
+}
+
+TEST(LandXmlArcs, StartTangentTouchesTheCircleAndTheRadialLineCrossesItTwice) {
+  SVY_SKIP_WITHOUT_REFDATA();
+  const Collected arcs = collect("Curve");
+  int tangentsChecked = 0;
+  for (std::size_t i = 0; i < arcs.elements.size(); ++i) {
+    const Element& arc = arcs.elements[i];
+    SCOPED_TRACE(arc.file + ": " + arc.head);
+    C2dPos start, center;
+    ASSERT_TRUE(childPos(arc.body, "Start", start));
+    ASSERT_TRUE(childPos(arc.body, "Center", center));
+    const double radius = std::hypot(start.north() - center.north(), start.east() - center.east());
+    C2dPos s1, s2;
+    // From the centre outward through the start: the opposite point first, the start second.
+    ASSERT_EQ(IntersectionCoordsOfLineAndCircle(center, start, center, radius, s1, s2), 2);
+    EXPECT_NEAR(s2.north(), start.north(), 1e-8);
+    EXPECT_NEAR(s2.east(), start.east(), 1e-8);
+    EXPECT_NEAR(s1.north(), 2 * center.north() - start.north(), 1e-8);
+    EXPECT_NEAR(s1.east(), 2 * center.east() - start.east(), 1e-8);
+
+    const double dirStart = attribute(arc.head, "dirStart") * arcs.radiansPerUnit[i];
+    if (std::isnan(dirStart)) continue;
+    double e = 0, n = 0;
+    Radiate2D(start.east(), start.north(), dirStart, 40.0, e, n);
+    ASSERT_EQ(IntersectionCoordsOfLineAndCircle(start, C2dPos(n, e), center, radius, s1, s2), 1);
+    // The touching point is the foot of the centre on the line: it moves along the line by the
+    // published rounding of the positions.
+    EXPECT_NEAR(s1.north(), start.north(), 1e-5);
+    EXPECT_NEAR(s1.east(), start.east(), 1e-5);
+    ++tangentsChecked;
+  }
+  EXPECT_GT(tangentsChecked, 0);
+}
+
+}  // namespace
