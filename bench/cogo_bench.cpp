@@ -1,0 +1,77 @@
+// Inverse, radiation and the circle solvers: called per point by curves, alignments and areas.
+#include <benchmark/benchmark.h>
+
+#include <cmath>
+#include <vector>
+
+#include "svymath/cogo/circle_solvers.h"
+#include "svymath/cogo/inverse_radiate.h"
+
+namespace {
+
+// Targets around a grid station in every direction, so that every quadrant's branch is taken.
+std::vector<C2dPos> targetsAround(const C2dPos& station, int count) {
+  std::vector<C2dPos> targets;
+  targets.reserve(static_cast<std::size_t>(count));
+  for (int i = 0; i < count; ++i) {
+    const double a = 0.37 + 6.283185307179586 * i / count;
+    const double d = 10.0 + 7.0 * i;
+    targets.emplace_back(station.north() + d * std::cos(a), station.east() + d * std::sin(a));
+  }
+  return targets;
+}
+
+const C2dPos kStation(5000000.0, 500000.0);
+
+void BM_Inverse2D(benchmark::State& state) {
+  const std::vector<C2dPos> targets = targetsAround(kStation, 64);
+  std::size_t i = 0;
+  for (auto _ : state) {
+    const C2dPos& t = targets[i++ & 63u];
+    double azimuth = 0.0;
+    double distance = 0.0;
+    benchmark::DoNotOptimize(Inverse2D(kStation.east(), kStation.north(), t.east(), t.north(), azimuth, distance));
+    benchmark::DoNotOptimize(azimuth);
+    benchmark::DoNotOptimize(distance);
+  }
+}
+BENCHMARK(BM_Inverse2D);
+
+void BM_Radiate2D(benchmark::State& state) {
+  double azimuth = 0.1;
+  for (auto _ : state) {
+    double e = 0.0;
+    double n = 0.0;
+    Radiate2D(kStation.east(), kStation.north(), azimuth, 123.456, e, n);
+    benchmark::DoNotOptimize(e);
+    benchmark::DoNotOptimize(n);
+    azimuth += 0.01;
+  }
+}
+BENCHMARK(BM_Radiate2D);
+
+void BM_LineAndCircle(benchmark::State& state) {
+  const std::vector<C2dPos> targets = targetsAround(kStation, 64);
+  std::size_t i = 0;
+  for (auto _ : state) {
+    C2dPos s1, s2;
+    const C2dPos& t = targets[i++ & 63u];
+    benchmark::DoNotOptimize(IntersectionCoordsOfLineAndCircle(kStation, t, targets[0], 150.0, s1, s2));
+    benchmark::DoNotOptimize(s1);
+  }
+}
+BENCHMARK(BM_LineAndCircle);
+
+void BM_TwoCircles(benchmark::State& state) {
+  const std::vector<C2dPos> targets = targetsAround(kStation, 64);
+  std::size_t i = 0;
+  for (auto _ : state) {
+    C2dPos s1, s2;
+    const C2dPos& t = targets[i++ & 63u];
+    benchmark::DoNotOptimize(IntersectionCoordsOfTwoCircles(kStation, 300.0, t, 250.0, s1, s2));
+    benchmark::DoNotOptimize(s1);
+  }
+}
+BENCHMARK(BM_TwoCircles);
+
+}  // namespace
