@@ -2,6 +2,7 @@
 
 #include <cmath>
 
+#include "svymath/curves/curve_projection.h"
 #include "svymath/curves/spiral_factory.h"
 #include "svymath/curves/spiral_length_range.h"
 #include "svymath/foundation/constants.h"
@@ -84,6 +85,12 @@ bool CCurveDataSpiral1R::setLenAndR(double L, double R, bool toTheRight, bool is
   m_isTSSC = isTSSC;
   onDefinitionChanged();
   return ok;
+}
+
+bool CCurveDataSpiral1R::setLenAndR(double L, AlntElementLengthDisplay lengthDisplay, double R,
+                                    AlntElementRadiusDisplay radiusDisplay, bool toTheRight, bool isTSSC) {
+  m_flags = svy_math::withLengthDisplay(svy_math::withRadiusDisplay(m_flags, radiusDisplay), lengthDisplay);
+  return setLenAndR(L, R, toTheRight, isTSSC);
 }
 
 bool CCurveDataSpiral1R::setLenAndSpPrm(double L, double K, bool isTSSC) {
@@ -250,10 +257,7 @@ bool CCurveDataSpiral1R::getShortestDistAndCurveLen(double north, double east, d
   double n = 0.0;
   double e = 0.0;
   if (!getPosAtLength(bestLen, n, e)) return false;
-  // Side: the cross product of the direction of travel and the vector to the point.
-  const double az = GetAzimuth(bestLen) * svy_math::units::kDegToRad;
-  const double across = -std::sin(az) * (north - n) + std::cos(az) * (east - e);
-  dist = across < 0.0 ? -std::sqrt(best) : std::sqrt(best);
+  dist = svy_math::detail::signedDistance(north, east, n, e, GetAzimuth(bestLen) * svy_math::units::kDegToRad);
   len = bestLen;
   return true;
 }
@@ -306,5 +310,14 @@ bool CCurveDataSpiral1R::GetSpiralElement(double& length, double& radius, bool& 
   radius = getRadius();
   toTheRight = isToTheRight();
   isTSSC = m_isTSSC;
+  return true;
+}
+
+bool CCurveDataSpiral1R::GetSpiralElement(double& length, AlntElementLengthDisplay& lengthDisplay, double& radius,
+                                          AlntElementRadiusDisplay& radiusDisplay, bool& toTheRight,
+                                          bool& isTSSC) const {
+  if (!GetSpiralElement(length, radius, toTheRight, isTSSC)) return false;
+  lengthDisplay = svy_math::getLengthDisplay(m_flags);
+  radiusDisplay = svy_math::getRadiusDisplay(m_flags);
   return true;
 }

@@ -13,6 +13,7 @@
 // the element from its start.
 #include <cstdint>
 
+#include "svymath/curves/curve_display.h"
 #include "svymath/curves/spiral_base.h"
 #include "svymath/curves/spiral_type.h"
 #include "svymath/foundation/class_new.h"
@@ -43,6 +44,9 @@ class SVYMATH_API CCurveDataSpiral1R {
   bool recreateSimpleSpiral(AlntMathSpiralType type);
   // Length L and end radius R (its sign is ignored: the side comes from toTheRight).
   bool setLenAndR(double L, double R, bool toTheRight, bool isTSSC);
+  // The same, recording in the flags the form in which the user entered the length and the radius.
+  bool setLenAndR(double L, AlntElementLengthDisplay lengthDisplay, double R, AlntElementRadiusDisplay radiusDisplay,
+                  bool toTheRight, bool isTSSC);
   // Length and spiral constant K = R*L (see the law for the clothoid's treatment of it).
   bool setLenAndSpPrm(double L, double K, bool isTSSC);
   // The full spiral whose part between the radii R1 and R2 (in either order) is L long. This record covers
@@ -91,6 +95,9 @@ class SVYMATH_API CCurveDataSpiral1R {
 
   // Length, radius, side and direction as they were set (the law's own values for a full spiral).
   bool GetSpiralElement(double& length, double& radius, bool& toTheRight, bool& isTSSC) const;
+  // The same with the recorded forms of entry.
+  bool GetSpiralElement(double& length, AlntElementLengthDisplay& lengthDisplay, double& radius,
+                        AlntElementRadiusDisplay& radiusDisplay, bool& toTheRight, bool& isTSSC) const;
 
   // The flags word (bits 4-6 radius display, bits 7-9 length display, the rest the host's).
   std::uint32_t getFlags() const { return m_flags; }
