@@ -64,10 +64,11 @@ matr3_3 covar::eigen() {
 
 TAbstractPoint3<double> covar::GetEigen(double confidenceFactor) const {
   covar diagonal(*this);
-  diagonal.eigen();
+  const matr3_3 vectors = diagonal.eigen();
+  TAbstractPoint3<double> axes(undefinedValue());
+  if (isUndefined(vectors(0, 0))) return axes;
   int order[3];
   orderByEigenvalue(diagonal, order);
-  TAbstractPoint3<double> axes;
   for (int k = 0; k < 3; ++k) {
     const double value = diagonal(order[k], order[k]);
     axes[k] = confidenceFactor * std::sqrt(value < 0.0 ? 0.0 : value);

@@ -38,7 +38,7 @@ class SVYMATH_API covar {
   matr3_3 eigen();
   // The semi-axes of the error ellipsoid for a confidence factor k (1 for the standard ellipsoid, 2.7955
   // for 95 % in 3-D): k * sqrt(eigenvalue), largest first; a slightly negative eigenvalue (rounding of a
-  // semi-definite covariance) gives 0. This covariance is not changed.
+  // semi-definite covariance) gives 0, a non-finite element NaN axes. This covariance is not changed.
   TAbstractPoint3<double> GetEigen(double confidenceFactor) const;
   // The rotation from the eigen frame to this covariance's frame (the derivative of user coordinates by
   // eigen coordinates): its columns are the unit eigenvectors, largest eigenvalue first, with the third
