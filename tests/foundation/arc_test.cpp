@@ -1,0 +1,228 @@
+// Circular arc records: every setter, fed the same arc in its own terms, must give the same centre, radius,
+// sweep, end point, middle point and tangents, all checked against positions computed here from the polar
+// form of the arc. Setters that cannot define an arc leave the record untouched.
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "svymath/foundation/arc.h"
+#include "svymath/foundation/constants.h"
+
+namespace {
+
+constexpr double kPi = svy_math::units::kPi;
+constexpr double kTwoPi = svy_math::units::kTwoPi;
+
+// An arc in polar form: centre, radius, azimuth of the start seen from the centre, signed sweep
+// (clockwise positive).
+struct PolarArc {
+  const char* name;
+  C2dPos centre;
+  double radius;
+  double startRadial;
+  double sweep;
+  double tolerance;
+
+  C2dPos pointAt(double radial) const {
+    return C2dPos(centre.north() + radius * std::cos(radial), centre.east() + radius * std::sin(radial));
+  }
+  C2dPos start() const { return pointAt(startRadial); }
+  C2dPos finish() const { return pointAt(startRadial + sweep); }
+  C2dPos middle() const { return pointAt(startRadial + sweep / 2); }
+  bool clockwise() const { return sweep > 0; }
+  // The tangent is a quarter turn from the radius, towards the direction of travel.
+  double tangentAt(double radial) const { return radial + (clockwise() ? kPi / 2 : -kPi / 2); }
+  double startTangent() const { return tangentAt(startRadial); }
+  double finishTangent() const { return tangentAt(startRadial + sweep); }
+};
+
+std::ostream& operator<<(std::ostream& os, const PolarArc& a) { return os << a.name; }
+
+CMathAngle rad(double r) {
+  CMathAngle a;
+  a.setRad(r);
+  return a;
+}
+
+void expectSamePos(const C2dPos& actual, const C2dPos& expected, double tol, const std::string& what) {
+  EXPECT_NEAR(actual.north(), expected.north(), tol) << what;
+  EXPECT_NEAR(actual.east(), expected.east(), tol) << what;
+}
+
+void expectArc(const CArc& arc, const PolarArc& ref, const std::string& setter) {
+  const double tol = ref.tolerance;
+  EXPECT_FALSE(arc.fullCircle) << setter;
+  EXPECT_EQ(arc.clockwise, ref.clockwise()) << setter;
+  expectSamePos(arc.start, ref.start(), tol, setter + " start");
+  expectSamePos(arc.center, ref.centre, tol, setter + " centre");
+  EXPECT_NEAR(arc.getRadius(), ref.radius, tol) << setter;
+  EXPECT_NEAR(arc.getSweep(), ref.sweep, 1e-9) << setter;
+  EXPECT_NEAR(arc.getLength(), ref.radius * std::fabs(ref.sweep), tol) << setter;
+  C2dPos p;
+  ASSERT_TRUE(arc.get_end_pos(p)) << setter;
+  expectSamePos(p, ref.finish(), tol, setter + " finish");
+  ASSERT_TRUE(arc.get_middle_pos_on_the_arc(p)) << setter;
+  expectSamePos(p, ref.middle(), tol, setter + " middle");
+  CMathAngle az;
+  ASSERT_TRUE(arc.get_start_tgdir(az)) << setter;
+  EXPECT_TRUE(az.isEqual(rad(ref.startTangent()), 1e-9)) << setter << " start tangent " << az.getRad();
+  ASSERT_TRUE(arc.get_end_tgdir(az)) << setter;
+  EXPECT_TRUE(az.isEqual(rad(ref.finishTangent()), 1e-9)) << setter << " finish tangent " << az.getRad();
+}
+
+class ArcSetters : public ::testing::TestWithParam<PolarArc> {};
+
+TEST_P(ArcSetters, AllAgreeOnTheSameArc) {
+  const PolarArc& ref = GetParam();
+  const bool upToHalf = std::fabs(ref.sweep) <= kPi;
+  CArc arc;
+
+  ASSERT_TRUE(arc.set_start_center_finish(ref.start(), ref.centre, ref.finish(), ref.clockwise()));
+  expectArc(arc, ref, "start_center_finish");
+
+  ASSERT_TRUE(arc.set_r_start_center_finish(ref.radius, rad(ref.startRadial), ref.centre,
+                                            rad(ref.startRadial + ref.sweep), ref.clockwise()));
+  expectArc(arc, ref, "r_start_center_finish");
+
+  ASSERT_TRUE(arc.set_start_finish_bulge(ref.start(), ref.finish(), std::tan(ref.sweep / 4)));
+  expectArc(arc, ref, "bulge");
+
+  ASSERT_TRUE(arc.set_start_finish_startTgDir(ref.start(), ref.finish(), rad(ref.startTangent())));
+  expectArc(arc, ref, "startTgDir");
+
+  ASSERT_TRUE(arc.set_start_finish_finishTgDir(ref.start(), ref.finish(), rad(ref.finishTangent())));
+  expectArc(arc, ref, "finishTgDir");
+
+  ASSERT_TRUE(arc.set_start_finish_plusPos(ref.start(), ref.finish(), ref.pointAt(ref.startRadial + ref.sweep / 3)));
+  expectArc(arc, ref, "plusPos");
+
+  ASSERT_TRUE(arc.set_start_r_length(ref.start(), rad(ref.startTangent()), ref.radius,
+                                     ref.radius * std::fabs(ref.sweep), ref.clockwise()));
+  expectArc(arc, ref, "r_length");
+
+  if (upToHalf) {
+    ASSERT_TRUE(arc.set_r_start_finish(ref.radius, ref.start(), ref.finish(), ref.clockwise()));
+    expectArc(arc, ref, "r_start_finish");
+    ASSERT_TRUE(arc.set_start_center_cAngle(ref.start(), ref.centre, rad(std::fabs(ref.sweep)), ref.clockwise()));
+    expectArc(arc, ref, "start_center_cAngle");
+    ASSERT_TRUE(arc.set_start_finish_turn(ref.start(), ref.finish(), rad(ref.sweep)));
+    expectArc(arc, ref, "turn");
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, ArcSetters,
+    ::testing::Values(PolarArc{"QuarterRight", C2dPos(0, 0), 100, 0.3, kPi / 2, 1e-9},
+                      PolarArc{"QuarterLeft", C2dPos(10, -20), 50, -2.0, -kPi / 2, 1e-9},
+                      PolarArc{"ShallowRight", C2dPos(-300, 40), 2500, 2.9, 0.01, 1e-7},
+                      PolarArc{"NearHalfLeft", C2dPos(1, 1), 7, 1.0, -(kPi - 1e-3), 1e-9},
+                      PolarArc{"MajorRight", C2dPos(0, 0), 30, -1.0, 1.5 * kPi, 1e-9},
+                      PolarArc{"MajorLeft", C2dPos(5, 5), 12.5, 3.0, -1.75 * kPi, 1e-9},
+                      PolarArc{"GridCoordinates", C2dPos(5123456.789, 512345.678), 350, 0.7, 0.8, 1e-6}),
+    [](const ::testing::TestParamInfo<PolarArc>& param) { return std::string(param.param.name); });
+
+TEST(ArcSetters, HalfCircleFromBulgeOneAndDiameterChord) {
+  CArc arc;
+  ASSERT_TRUE(arc.set_start_finish_bulge(C2dPos(0, 0), C2dPos(0, 10), 1.0));
+  EXPECT_TRUE(arc.clockwise);
+  expectSamePos(arc.center, C2dPos(0, 5), 1e-12, "centre");
+  C2dPos middle;
+  ASSERT_TRUE(arc.get_middle_pos_on_the_arc(middle));
+  expectSamePos(middle, C2dPos(5, 5), 1e-12, "middle");  // clockwise from west to east passes north
+  ASSERT_TRUE(arc.set_r_start_finish(5.0, C2dPos(0, 0), C2dPos(0, 10), false));
+  ASSERT_TRUE(arc.get_middle_pos_on_the_arc(middle));
+  expectSamePos(middle, C2dPos(-5, 5), 1e-9, "middle");
+  // A chord a hair longer than the diameter (rounding) still gives the half circle.
+  ASSERT_TRUE(arc.set_r_start_finish(5.0 - 1e-13, C2dPos(0, 0), C2dPos(0, 10), true));
+  EXPECT_NEAR(std::fabs(arc.getSweep()), kPi, 1e-6);
+}
+
+TEST(ArcFullCircles, CentreRadiusAndStartTangent) {
+  CArc arc;
+  ASSERT_TRUE(arc.set_center_R_startAz_direction(C2dPos(10, 20), 5, rad(0), true));
+  expectSamePos(arc.start, C2dPos(10, 15), 1e-12, "clockwise start lies west for a north tangent");
+  EXPECT_TRUE(arc.fullCircle);
+  EXPECT_EQ(arc.centralAngle.getRad(), 0);
+  EXPECT_DOUBLE_EQ(arc.getSweep(), kTwoPi);
+  EXPECT_NEAR(arc.getLength(), kTwoPi * 5, 1e-12);
+  CMathAngle az;
+  ASSERT_TRUE(arc.get_start_tgdir(az));
+  EXPECT_NEAR(az.getRad(), 0, 1e-12);
+  C2dPos middle;
+  ASSERT_TRUE(arc.get_middle_pos_on_the_arc(middle));
+  expectSamePos(middle, C2dPos(10, 25), 1e-12, "opposite point");
+  ASSERT_TRUE(arc.set_center_R_startAz_direction(C2dPos(10, 20), 5, rad(kPi / 2), false));
+  expectSamePos(arc.start, C2dPos(5, 20), 1e-12, "counter-clockwise start lies south for an east tangent");
+  EXPECT_DOUBLE_EQ(arc.getSweep(), -kTwoPi);
+  ASSERT_TRUE(arc.get_start_tgdir(az));
+  EXPECT_NEAR(az.getRad(), kPi / 2, 1e-12);
+
+  ASSERT_TRUE(arc.set_center_R(C2dPos(1, 2), 3));
+  EXPECT_TRUE(arc.fullCircle);
+  EXPECT_NEAR(arc.getRadius(), 3, 1e-15);
+  ASSERT_TRUE(arc.set_start_center_finish(C2dPos(0, 5), C2dPos(0, 0), C2dPos(0, 9), false));
+  EXPECT_TRUE(arc.fullCircle);
+  EXPECT_DOUBLE_EQ(arc.getSweep(), -kTwoPi);
+  ASSERT_TRUE(arc.set_start_r_length(C2dPos(0, 0), rad(0), 2.0, kTwoPi * 2.0, true));
+  EXPECT_TRUE(arc.fullCircle);
+  expectSamePos(arc.center, C2dPos(0, 2), 1e-12, "centre right of a north tangent");
+}
+
+TEST(ArcFailures, LeaveTheRecordUnchanged) {
+  const double nan = std::numeric_limits<double>::quiet_NaN();
+  CArc arc;
+  ASSERT_TRUE(arc.set_start_center_finish(C2dPos(0, 10), C2dPos(0, 0), C2dPos(10, 0), false));
+  const CArc before = arc;
+  const C2dPos a(0, 0), b(0, 10), c(0, 20);
+  std::vector<std::pair<const char*, bool>> results = {
+      {"zero radius", arc.set_center_R(a, 0)},
+      {"negative radius", arc.set_center_R_startAz_direction(a, -1, rad(0), true)},
+      {"nan radius", arc.set_center_R(a, nan)},
+      {"chord beyond diameter", arc.set_r_start_finish(4.9, a, b, true)},
+      {"coincident ends", arc.set_r_start_finish(5, a, a, true)},
+      {"start on centre", arc.set_start_center_finish(a, a, b, true)},
+      {"finish on centre", arc.set_start_center_finish(b, a, a, true)},
+      {"zero central angle", arc.set_start_center_cAngle(b, a, rad(0), true)},
+      {"zero bulge", arc.set_start_finish_bulge(a, b, 0)},
+      {"nan bulge", arc.set_start_finish_bulge(a, b, nan)},
+      {"bulge on coincident ends", arc.set_start_finish_bulge(a, a, 1)},
+      {"collinear plus point", arc.set_start_finish_plusPos(a, c, b)},
+      {"plus point on start", arc.set_start_finish_plusPos(a, c, a)},
+      {"tangent along chord", arc.set_start_finish_startTgDir(a, b, rad(kPi / 2))},
+      {"tangent against chord", arc.set_start_finish_finishTgDir(a, b, rad(-kPi / 2))},
+      {"zero turn", arc.set_start_finish_turn(a, b, rad(0))},
+      {"length beyond circumference", arc.set_start_r_length(a, rad(0), 1, 7, true)},
+      {"zero length", arc.set_start_r_length(a, rad(0), 1, 0, true)},
+      {"nan start", arc.set_start_center_finish(C2dPos(nan, 0), a, b, true)},
+  };
+  for (const auto& r : results) {
+    EXPECT_FALSE(r.second) << r.first;
+  }
+  EXPECT_EQ(arc.start, before.start);
+  EXPECT_EQ(arc.center, before.center);
+  EXPECT_EQ(arc.centralAngle.getRad(), before.centralAngle.getRad());
+  EXPECT_EQ(arc.clockwise, before.clockwise);
+  EXPECT_EQ(arc.fullCircle, before.fullCircle);
+
+  const CArc empty;
+  CMathAngle az;
+  C2dPos p;
+  EXPECT_FALSE(empty.get_start_tgdir(az));
+  EXPECT_FALSE(empty.get_middle_pos_on_the_arc(p));
+}
+
+TEST(ArcCalculator, HoldsOneArc) {
+  CArc arc;
+  ASSERT_TRUE(arc.set_center_R(C2dPos(1, 1), 2));
+  CArcCalculator calc;
+  calc.setArc(arc);
+  EXPECT_EQ(calc.getArc().center, arc.center);
+  calc.getArc().clockwise = false;
+  EXPECT_FALSE(calc.getArc().clockwise);
+}
+
+}  // namespace

@@ -1,0 +1,342 @@
+// CMathAngle and svy_math::TAngle: closed range ends, the two equalities, unset arithmetic, cache
+// consistency under the in-place reflections, rotations and azimuths in the north-east convention.
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+
+#include "svymath/foundation/constants.h"
+#include "svymath/foundation/math_angle.h"
+#include "svymath/foundation/tangle.h"
+
+namespace {
+
+constexpr double kPi = svy_math::units::kPi;
+const double kNaN = std::numeric_limits<double>::quiet_NaN();
+const double kInf = std::numeric_limits<double>::infinity();
+
+CMathAngle radians(double r) {
+  CMathAngle a;
+  a.setRad(r);
+  return a;
+}
+
+CMathAngle unset() {
+  CMathAngle a;
+  a.reset();
+  return a;
+}
+
+struct DegCase {
+  double deg, rad;
+};
+
+class AngleStore : public ::testing::TestWithParam<DegCase> {};
+
+TEST_P(AngleStore, ReducesToClosedRange) {
+  const DegCase& c = GetParam();
+  EXPECT_NEAR(CMathAngle(c.deg).getRad(), c.rad, 1e-12) << c.deg;
+}
+
+INSTANTIATE_TEST_SUITE_P(Cases, AngleStore,
+                         ::testing::Values(DegCase{180, kPi}, DegCase{-180, -kPi}, DegCase{540, kPi},
+                                           DegCase{-540, -kPi}, DegCase{270, -kPi / 2}, DegCase{-270, kPi / 2},
+                                           DegCase{720, 0}, DegCase{45, kPi / 4}));
+
+TEST(AngleStore, NonFiniteAndHugeInputNeverHang) {
+  EXPECT_TRUE(radians(kInf).isNan());
+  EXPECT_TRUE(radians(-kInf).isNan());
+  EXPECT_TRUE(radians(kNaN).isNan());
+  EXPECT_EQ(radians(kNaN).getRad(), 0.0);
+  for (double x : {1e300, -1e300, 1e20}) {
+    const CMathAngle a = radians(x);
+    EXPECT_GE(a.getRad(), -kPi);
+    EXPECT_LE(a.getRad(), kPi);
+  }
+  CMathAngle a(30.0);
+  a *= 1e300;
+  EXPECT_TRUE(a.isok());
+  a *= -1e300;
+  EXPECT_TRUE(a.isok());
+  EXPECT_LE(std::fabs(a.getRad()), kPi);
+  CMathAngle b(30.0);
+  b *= kInf;
+  EXPECT_TRUE(b.isNan());
+  EXPECT_TRUE(CMathAngle(kNaN).isNan());
+}
+
+TEST(AngleEquality, OperatorEqualsHasNoWrapButIsEqualHas) {
+  const CMathAngle plus = radians(kPi);
+  const CMathAngle minus = radians(-kPi);
+  EXPECT_FALSE(plus == minus);
+  EXPECT_TRUE(plus != minus);
+  EXPECT_TRUE(plus.isEqual(minus, 1e-9));
+  EXPECT_TRUE(radians(1e-13).isEqual(radians(2 * kPi - 1e-13), 1e-9));
+  EXPECT_TRUE(radians(0.5) == radians(0.5 + 1e-13));
+  const double step = std::ldexp(1.0, -20);  // exact differences: the test is strict on both sides
+  EXPECT_FALSE(radians(0.5).isEqual(radians(0.5 + step), step));
+  EXPECT_FALSE(radians(0.5 + step).isEqual(radians(0.5), step));
+  EXPECT_TRUE(radians(0.5).isEqual(radians(0.5 + step), 2 * step));
+  EXPECT_TRUE(radians(-1) < radians(0.5));
+  EXPECT_TRUE(unset() <= radians(0));
+  EXPECT_TRUE(unset() >= radians(0));
+}
+
+TEST(AngleSetters, TangentAndAzimuthForms) {
+  CMathAngle a(10.0);
+  EXPECT_TRUE(a.setTg(0, 0));
+  EXPECT_EQ(a.getRad(), 0);
+  a.setDeg(10);
+  EXPECT_FALSE(a.setTg(kNaN, 1));
+  EXPECT_FALSE(a.setTg(1, kNaN));
+  EXPECT_NEAR(a.getDeg(), 10, 1e-12);
+  EXPECT_TRUE(a.setAz(C2dPos(0, 0), C2dPos(0, 1)));
+  EXPECT_DOUBLE_EQ(a.getRad(), kPi / 2);
+  EXPECT_TRUE(a.setAz(C2dPos(0, 0), C2dPos(-1, 0)));
+  EXPECT_DOUBLE_EQ(a.getRad(), kPi);
+  EXPECT_TRUE(a.setAz(C2dPos(-1, -1)));
+  EXPECT_DOUBLE_EQ(a.getDeg(), -135);
+  EXPECT_TRUE(a.setAz(3.0, -3.0));
+  EXPECT_DOUBLE_EQ(a.getDeg(), -45);
+  EXPECT_TRUE(a.setAz(10, 10, 10, 20));
+  EXPECT_DOUBLE_EQ(a.getDeg(), 90);
+  EXPECT_TRUE(a.setTg(kInf, 1));
+  EXPECT_DOUBLE_EQ(a.getRad(), kPi / 2);
+}
+
+TEST(AngleSetters, AngleAtVertexIsClockwiseFromFirstRay) {
+  CMathAngle a;
+  EXPECT_TRUE(a.setAngle(C2dPos(1, 0), C2dPos(0, 0), C2dPos(0, 1)));
+  EXPECT_DOUBLE_EQ(a.getRad(), kPi / 2);
+  EXPECT_TRUE(a.setAngle(C2dPos(0, 1), C2dPos(0, 0), C2dPos(1, 0)));
+  EXPECT_DOUBLE_EQ(a.getRad(), -kPi / 2);
+  a.setDeg(5);
+  EXPECT_FALSE(a.setAngle(C2dPos(0, 0), C2dPos(0, 0), C2dPos(1, 0)));
+  EXPECT_FALSE(a.setAngle(C2dPos(1, 0), C2dPos(0, 0), C2dPos(kNaN, 0)));
+  EXPECT_NEAR(a.getDeg(), 5, 1e-12);
+}
+
+TEST(AngleSetters, DmsTakesTheSignFromTheDegrees) {
+  CMathAngle a;
+  a.setDMS(12, 30, 36);
+  EXPECT_NEAR(a.getDeg(), 12.51, 1e-12);
+  a.setDMS(-12, 30, 36);
+  EXPECT_NEAR(a.getDeg(), -12.51, 1e-12);
+  a.setDMS(-0.0, 30, 0);
+  EXPECT_NEAR(a.getDeg(), 0.5, 1e-12);
+}
+
+TEST(AngleSetters, BulgeIsFourTimesItsArcTangentReduced) {
+  CMathAngle a;
+  EXPECT_TRUE(a.setBulge(1));
+  EXPECT_NEAR(a.getRad(), kPi, 1e-12);
+  EXPECT_TRUE(a.setBulge(2));
+  EXPECT_NEAR(a.getRad(), 4 * std::atan(2.0) - 2 * kPi, 1e-12);
+  EXPECT_NEAR(a.getRad(), -1.8546, 1e-4);
+  EXPECT_TRUE(a.setBulge(-0.5));
+  EXPECT_NEAR(a.getRad(), -4 * std::atan(0.5), 1e-12);
+  EXPECT_FALSE(a.setBulge(kNaN));
+}
+
+TEST(AngleSetters, ChordAndRadiusIsTwiceTheChordToRadiusAngle) {
+  for (double r : {1.0, 10.0, 250.0}) {
+    for (double c : {0.1 * r, r, 1.9 * r}) {
+      CMathAngle a;
+      a.setChordAndR(c, r);
+      const double central = 2 * std::asin(c / (2 * r));
+      EXPECT_NEAR(a.getRad(), kPi - central, 1e-12) << r << " " << c;
+    }
+  }
+  CMathAngle a;
+  a.setChordAndR(3, 1);
+  EXPECT_TRUE(a.isNan());
+}
+
+TEST(AngleQueries, RightAngleHasZeroTangent) {
+  EXPECT_EQ(radians(kPi / 2).getTg(), 0.0);
+  EXPECT_EQ(radians(-kPi / 2).getTg(), 0.0);
+  EXPECT_EQ(radians(0).getCtg(), 0.0);
+  EXPECT_NEAR(CMathAngle(30.0).getTg(), std::tan(kPi / 6), 1e-15);
+  EXPECT_NEAR(CMathAngle(30.0).getCtg(), 1 / std::tan(kPi / 6), 1e-14);
+}
+
+TEST(AngleQueries, QuadrantOfAnAngleThatReducesToTwoPi) {
+  const TQuadrant ne = CMathAngle(45.0).getQuadrant();
+  EXPECT_TRUE(ne.northward && ne.eastward);
+  const TQuadrant se = CMathAngle(135.0).getQuadrant();
+  EXPECT_TRUE(!se.northward && se.eastward);
+  const TQuadrant sw = CMathAngle(-135.0).getQuadrant();
+  EXPECT_TRUE(!sw.northward && !sw.eastward);
+  const TQuadrant nw = CMathAngle(-45.0).getQuadrant();
+  EXPECT_TRUE(nw.northward && !nw.eastward);
+  // -1e-17 + 2pi rounds to exactly 2pi: quadrant "5", neither northward nor eastward.
+  const TQuadrant q = radians(-1e-17).getQuadrant();
+  EXPECT_FALSE(q.northward);
+  EXPECT_FALSE(q.eastward);
+  const TQuadrant def;
+  EXPECT_TRUE(def.northward && def.eastward);
+}
+
+TEST(AngleQueries, DmsLosesTheSignBelowOneDegree) {
+  int d = 0, m = 0;
+  double s = 0;
+  CMathAngle(-0.5).getDMS(d, m, s);
+  EXPECT_EQ(d, 0);
+  EXPECT_EQ(m, 30);
+  EXPECT_NEAR(s, 0, 1e-9);
+  CMathAngle(-12.51).getDMS(d, m, s);
+  EXPECT_EQ(d, -12);
+  EXPECT_EQ(m, 30);
+  EXPECT_NEAR(s, 36, 1e-9);
+  // Whole seconds survive the radian round trip without a 60 in any field.
+  for (int sec = 0; sec < 360 * 3600; sec += 997) {
+    CMathAngle(sec / 3600.0).getDMS(d, m, s);
+    EXPECT_LT(m, 60);
+    EXPECT_LT(s, 60 - 1e-12);
+    EXPECT_NEAR(std::fabs(d) * 3600 + m * 60 + s, sec <= 180 * 3600 ? sec : 360 * 3600 - sec, 1e-6) << sec;
+  }
+}
+
+TEST(AngleQueries, ZeroToTwoPiKeepsTheUpperEnd) {
+  EXPECT_NEAR(radians(-kPi / 2).get0To2PI(), 1.5 * kPi, 1e-15);
+  EXPECT_NEAR(radians(-kPi / 2).get0To360(), 270, 1e-12);
+  EXPECT_EQ(radians(0).get0To360(), 0);
+  EXPECT_EQ(radians(-1e-17).get0To2PI(), svy_math::units::kTwoPi);
+}
+
+TEST(AngleGeometry, DirectionsPositionsAndRotationsFollowTheNorthEastConvention) {
+  const CMathAngle east(90.0);
+  double n = 0, e = 0;
+  east.getPosAlong(10, 100, 200, n, e);
+  EXPECT_NEAR(n, 100, 1e-12);
+  EXPECT_NEAR(e, 210, 1e-12);
+  east.getPosAcross(5, 100, 200, n, e);  // right of east-bound travel is south
+  EXPECT_NEAR(n, 95, 1e-12);
+  EXPECT_NEAR(e, 200, 1e-12);
+  C2dPos to;
+  CMathAngle(0.0).getPosAcross(-2, C2dPos(1, 1), to);  // left of north-bound travel is west
+  EXPECT_NEAR(to.east(), -1, 1e-12);
+  n = 1;
+  e = 0;
+  east.getRotated(n, e);  // clockwise on the map: north turns to east
+  EXPECT_NEAR(n, 0, 1e-15);
+  EXPECT_NEAR(e, 1, 1e-15);
+  const CMathAngle a(37.0);
+  for (const C2dPos& p : {C2dPos(3, -4), C2dPos(-1e5, 2e5), C2dPos(0.5, 0.25)}) {
+    double rn = p.north(), re = p.east();
+    a.getRotated(rn, re);
+    EXPECT_NEAR(std::hypot(rn, re), p.Module(), 1e-9);
+    a.getRotatedBack(rn, re);
+    EXPECT_NEAR(rn, p.north(), 1e-9);
+    EXPECT_NEAR(re, p.east(), 1e-9);
+  }
+  C2dPos r;
+  CMathAngle(180.0).getRotatedPoint(C2dPos(10, 10), C2dPos(11, 10), r);
+  EXPECT_NEAR(r.north(), 9, 1e-12);
+  EXPECT_NEAR(r.east(), 10, 1e-12);
+  EXPECT_TRUE(CMathAngle(30.0).isSameAsAzimuth(C2dPos(0, 0), C2dPos(std::cos(kPi / 6), std::sin(kPi / 6))));
+  EXPECT_FALSE(CMathAngle(31.0).isSameAsAzimuth(C2dPos(0, 0), C2dPos(std::cos(kPi / 6), std::sin(kPi / 6))));
+  EXPECT_TRUE(CMathAngle(89.0).isSharp());
+  EXPECT_FALSE(CMathAngle(90.0).isSharp());
+  EXPECT_FALSE(CMathAngle(-90.0).isSharp());
+}
+
+TEST(AngleArithmetic, DivisionByZeroDiffersBetweenOperatorAndCompoundForm) {
+  const CMathAngle a(30.0);
+  const CMathAngle q = a / 0.0;
+  EXPECT_TRUE(q.isok());
+  EXPECT_EQ(q.getRad(), 0);
+  EXPECT_EQ((a / 1e-13).getRad(), 0);
+  CMathAngle b(30.0);
+  b /= 0.0;
+  EXPECT_TRUE(b.isNan());
+  CMathAngle c(30.0);
+  c /= 2.0;
+  EXPECT_NEAR(c.getDeg(), 15, 1e-12);
+}
+
+TEST(AngleArithmetic, UnsetOperands) {
+  const CMathAngle a(30.0);
+  EXPECT_NEAR((a + unset()).getDeg(), 30, 1e-12);
+  EXPECT_NEAR((a - unset()).getDeg(), 30, 1e-12);
+  const CMathAngle z = unset() + a;
+  EXPECT_TRUE(z.isok());
+  EXPECT_EQ(z.getRad(), 0);
+  EXPECT_EQ((unset() * 3.0).getRad(), 0);
+  EXPECT_TRUE((unset() * 3.0).isok());
+  CMathAngle u = unset();
+  u += a;
+  EXPECT_TRUE(u.isNan());
+  u *= 2;
+  EXPECT_TRUE(u.isNan());
+  u /= 0;
+  EXPECT_TRUE(u.isNan());
+}
+
+TEST(AngleArithmetic, SumsWrapIntoTheClosedRange) {
+  for (double x : {-170.0, -90.0, 0.0, 45.0, 170.0}) {
+    for (double y : {-100.0, 20.0, 135.0}) {
+      const CMathAngle s = CMathAngle(x) + CMathAngle(y);
+      EXPECT_TRUE(s.isEqual(CMathAngle(x + y), 1e-12)) << x << " " << y;
+      EXPECT_GE(s.getRad(), -kPi);
+      EXPECT_LE(s.getRad(), kPi);
+      CMathAngle d(x);
+      d -= CMathAngle(y);
+      EXPECT_TRUE(d.isEqual(CMathAngle(x - y), 1e-12));
+    }
+  }
+  CMathAngle m(100.0);
+  m *= 2;
+  EXPECT_NEAR(m.getDeg(), -160, 1e-12);
+}
+
+TEST(AngleCaches, ReflectionsKeepCachesConsistentWithTheValue) {
+  for (double deg : {-170.0, -90.0, -30.0, 0.0, 60.0, 135.0, 180.0}) {
+    using Reflect = void (CMathAngle::*)();
+    for (Reflect reflect : {static_cast<Reflect>(&CMathAngle::setComplimentary), &CMathAngle::set90MinusThis,
+                            &CMathAngle::setSupplementary, &CMathAngle::set180MinusThis, &CMathAngle::changeSign}) {
+      CMathAngle warm(deg);
+      warm.getSin();
+      warm.getCos();
+      CMathAngle cold(deg);
+      (warm.*reflect)();
+      (cold.*reflect)();
+      EXPECT_GE(warm.getRad(), -kPi);
+      EXPECT_LE(warm.getRad(), kPi);
+      EXPECT_NEAR(warm.getSin(), std::sin(warm.getRad()), 1e-15) << deg;
+      EXPECT_NEAR(warm.getCos(), std::cos(warm.getRad()), 1e-15) << deg;
+      EXPECT_NEAR(cold.getSin(), std::sin(cold.getRad()), 1e-15) << deg;
+      EXPECT_DOUBLE_EQ(warm.getRad(), cold.getRad());
+      CMathAngle none = unset();
+      (none.*reflect)();
+      EXPECT_TRUE(none.isNan());
+    }
+  }
+  CMathAngle a(30.0);
+  a.setComplimentary();
+  EXPECT_NEAR(a.getDeg(), 60, 1e-12);
+  a.setSupplementary();
+  EXPECT_NEAR(a.getDeg(), 120, 1e-12);
+  a.changeSign();
+  EXPECT_NEAR(a.getDeg(), -120, 1e-12);
+}
+
+TEST(TAngleTwin, ConstructsFromRadiansAndSharesTheRules) {
+  const svy_math::TAngle t(kPi / 2);
+  EXPECT_DOUBLE_EQ(t.getDouble(), kPi / 2);
+  EXPECT_NEAR(CMathAngle(90.0).getRad(), t.getRad(), 1e-15);
+  EXPECT_EQ(svy_math::TAngle().getDouble(), 0);
+  EXPECT_DOUBLE_EQ(svy_math::TAngle(-kPi).getNegPIToPI(), kPi);
+  EXPECT_NEAR(svy_math::TAngle(-kPi / 2).get0To2PI(), 1.5 * kPi, 1e-15);
+  EXPECT_DOUBLE_EQ(svy_math::absoluteAngle(svy_math::TAngle(-1.0)).getDouble(), 1.0);
+  const svy_math::TAngle sum = t + svy_math::TAngle(kPi);
+  EXPECT_NEAR(sum.getDouble(), -kPi / 2, 1e-15);
+  svy_math::TAngle q(1.0);
+  EXPECT_EQ((q / 0.0).getDouble(), 0);
+  q /= 0.0;
+  EXPECT_TRUE(q.isNan());
+  EXPECT_TRUE(svy_math::TAngle(kPi) != svy_math::TAngle(-kPi));
+  EXPECT_TRUE(svy_math::TAngle(0.1) < svy_math::TAngle(0.2));
+}
+
+}  // namespace

@@ -1,0 +1,213 @@
+// Point templates, positions, coordinate records, extents and segment distance.
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <cstring>
+#include <limits>
+#include <vector>
+
+#include "svymath/foundation/abstract_point.h"
+#include "svymath/foundation/math_angle.h"
+#include "svymath/foundation/positions.h"
+
+namespace {
+
+using P2 = svy_math::TAbstractPoint2<double>;
+using P3 = svy_math::TAbstractPoint3<double>;
+const double kNaN = std::numeric_limits<double>::quiet_NaN();
+
+TEST(AbstractPoint, ArraysOfPointsAreArraysOfDoubles) {
+  std::vector<C2dPos> points = {C2dPos(1, 2), C2dPos(3, 4), C2dPos(5, 6)};
+  const double* raw = points[0];
+  for (int i = 0; i < 6; ++i) EXPECT_EQ(raw[i], i + 1);
+  const double values[3] = {7, 8, 9};
+  const P3 p = P3::CreateFromPointer(values);
+  EXPECT_EQ(p, P3(7, 8, 9));
+  P3 copy;
+  std::memcpy(static_cast<void*>(&copy), &p, sizeof p);
+  EXPECT_EQ(copy, p);
+  EXPECT_EQ(P2::CreateFromPointer(values), P2(7, 8));
+}
+
+TEST(AbstractPoint, ComponentWiseArithmetic) {
+  const P3 a(1, -2, 3), b(4, 5, -6);
+  EXPECT_EQ(a + b, P3(5, 3, -3));
+  EXPECT_EQ(a - b, P3(-3, -7, 9));
+  EXPECT_EQ(-a, P3(-1, 2, -3));
+  EXPECT_EQ(a * 2.0, P3(2, -4, 6));
+  EXPECT_EQ(a / 2.0, P3(0.5, -1, 1.5));
+  EXPECT_EQ(a * b, 4 - 10 - 18);
+  EXPECT_EQ(b / a, P3(4, -2.5, -2));
+  P3 c = a;
+  c *= b;
+  EXPECT_EQ(c, P3(4, -10, -18));
+  c /= b;
+  EXPECT_EQ(c, a);
+  c += b;
+  c -= b;
+  EXPECT_EQ(c, a);
+  c *= 3.0;
+  c /= 3.0;
+  EXPECT_EQ(c, a);
+  c.uminus();
+  EXPECT_EQ(c, -a);
+  EXPECT_EQ(a.abs(), P3(1, 2, 3));
+  EXPECT_EQ(a.maximum(b), P3(4, 5, 3));
+  EXPECT_EQ(a.minimum(b), P3(1, -2, -6));
+  EXPECT_EQ(a.sum(), 2);
+  EXPECT_EQ(P2(3, 4).Module(), 5);
+  EXPECT_EQ(P2(3, 4).ModuleSq(), 25);
+  EXPECT_EQ(P3(4, 9, 16).sqrt(), P3(2, 3, 4));
+}
+
+TEST(AbstractPoint, CrossProductIsOrthogonalWithLagrangeLength) {
+  const std::vector<P3> vs = {P3(1, 0, 0), P3(0, 1, 0), P3(1, 2, 3), P3(-4, 0.5, 2), P3(1e3, -1e-3, 7)};
+  for (const P3& u : vs) {
+    for (const P3& v : vs) {
+      const P3 w = u.VectorProduct(v);
+      const double scale = u.Module() * v.Module();
+      EXPECT_NEAR(w * u, 0, 1e-12 * scale * u.Module());
+      EXPECT_NEAR(w * v, 0, 1e-12 * scale * v.Module());
+      EXPECT_NEAR(w.ModuleSq(), u.ModuleSq() * v.ModuleSq() - (u * v) * (u * v), 1e-9 * scale * scale);
+    }
+  }
+  EXPECT_EQ(P3(1, 0, 0).VectorProduct(P3(0, 1, 0)), P3(0, 0, 1));
+}
+
+TEST(AbstractPoint, ExactComparisonAndScalarForms) {
+  const P2 withNan(kNaN, 1);
+  EXPECT_FALSE(withNan == withNan);
+  EXPECT_TRUE(withNan != withNan);
+  EXPECT_FALSE(P2(1, 1) == P2(1, 1 + 1e-15));
+  P3 p(1, 2, 3);
+  p = 4.5;
+  EXPECT_TRUE(p == 4.5);
+  EXPECT_FALSE(P3(4.5, 4.5, 4.6) == 4.5);
+  EXPECT_TRUE(P3(4.5, 4.5, 4.6) != 4.5);
+  EXPECT_EQ(P2(2.5), P2(2.5, 2.5));
+}
+
+struct PointCase {
+  double c0, c1;
+  long x, y;
+};
+
+class PointConversion : public ::testing::TestWithParam<PointCase> {};
+
+TEST_P(PointConversion, TruncatesTowardZero) {
+  const PointCase& c = GetParam();
+  const POINT pt = static_cast<POINT>(P2(c.c0, c.c1));
+  EXPECT_EQ(pt.x, c.x);
+  EXPECT_EQ(pt.y, c.y);
+}
+
+INSTANTIATE_TEST_SUITE_P(Cases, PointConversion,
+                         ::testing::Values(PointCase{2.9, -2.9, 2, -2}, PointCase{-0.99, 0.99, 0, 0},
+                                           PointCase{1e20, -1e20, 2147483647L, -2147483648L},
+                                           PointCase{kNaN, 7.0, 0, 7}));
+
+TEST(PointConversion, FromPointAndSize) {
+  POINT pt;
+  pt.x = 3;
+  pt.y = -4;
+  EXPECT_EQ(P2(pt), P2(3, -4));
+  svy_math::TAbstractSize2<double> size(P2(10, 20));
+  EXPECT_EQ(size.cx(), 10);
+  EXPECT_EQ(size.cy(), 20);
+  size.cx() = 11;
+  EXPECT_EQ(size[0], 11);
+}
+
+TEST(Positions, NamedComponentsAndCoords) {
+  C2dPos p(100, 200);
+  EXPECT_EQ(p[0], 100);
+  EXPECT_EQ(p[1], 200);
+  p.north() += 1;
+  p.east() -= 1;
+  EXPECT_EQ(p, C2dPos(101, 199));
+  const C2dPos q = p - C2dPos(1, -1);
+  EXPECT_EQ(q, C2dPos(100, 200));
+  EXPECT_EQ(C2dPos(), C2dPos(0, 0));
+  Coord c(1, 2, 3);
+  c = 7.0;
+  EXPECT_EQ(c, Coord(7, 7, 7));
+  EXPECT_EQ(c.x() + c.y() + c.z(), 21);
+}
+
+TEST(Coords, RotateAroundZKeepsDistanceAndHeight) {
+  TCoords t;
+  EXPECT_EQ(t.mask, 7u);
+  t.north = 10;
+  t.east = 0;
+  t.height = 5;
+  t.rotateAroundZ(CMathAngle(90.0));
+  EXPECT_NEAR(t.north, 0, 1e-12);
+  EXPECT_NEAR(t.east, 10, 1e-12);
+  EXPECT_EQ(t.height, 5);
+  const C2dPos centre(3, -7);
+  TCoords u;
+  u.north = 123.4;
+  u.east = -56.7;
+  const double before = (u.pos() - centre).Module();
+  u.rotateAroundZ(CMathAngle(33.0), centre);
+  EXPECT_NEAR((u.pos() - centre).Module(), before, 1e-10);
+  u.rotateAroundZ(CMathAngle(-33.0), centre);
+  EXPECT_NEAR(u.north, 123.4, 1e-10);
+  EXPECT_NEAR(u.east, -56.7, 1e-10);
+  u.east = kNaN;
+  EXPECT_FALSE(u.hasFinitePlanPosition());
+}
+
+TEST(Extents, IncludeGrowsFromEmpty) {
+  C2dMinMax box;
+  EXPECT_TRUE(box.empty);
+  EXPECT_FALSE(box.contains(C2dPos(0, 0)));
+  box.include(C2dPos(5, -3));
+  EXPECT_FALSE(box.empty);
+  box.include(C2dPos(-1, 8));
+  box.include(C2dPos(kNaN, 100));
+  EXPECT_EQ(box.minNorth, -1);
+  EXPECT_EQ(box.maxNorth, 5);
+  EXPECT_EQ(box.minEast, -3);
+  EXPECT_EQ(box.maxEast, 8);
+  EXPECT_TRUE(box.contains(C2dPos(0, 0)));
+  EXPECT_FALSE(box.contains(C2dPos(5.5, 0)));
+  EXPECT_TRUE(box.contains(C2dPos(5.5, 0), 0.5));
+  C2dMinMax other(C2dPos(20, 20), C2dPos(10, 9));
+  EXPECT_FALSE(other.empty);
+  EXPECT_EQ(other.minNorth, 10);
+  EXPECT_FALSE(box.intersects(other));
+  EXPECT_TRUE(box.intersects(other, 2.5));
+  box.include(other);
+  EXPECT_EQ(box.maxNorth, 20);
+  EXPECT_EQ(box.maxEast, 20);
+  box.include(C2dMinMax());
+  EXPECT_EQ(box.maxEast, 20);
+}
+
+struct SegmentCase {
+  const char* name;
+  C2dPos start, end, p;
+  double distance;
+};
+
+class SegmentDistance : public ::testing::TestWithParam<SegmentCase> {};
+
+TEST_P(SegmentDistance, PerpendicularInsideNearestEndOutside) {
+  const SegmentCase& c = GetParam();
+  EXPECT_NEAR(C2dSegment(c.start, c.end).getDistance(c.p), c.distance, 1e-12) << c.name;
+  EXPECT_NEAR(C2dSegment(c.end, c.start).getDistance(c.p), c.distance, 1e-12) << c.name << " reversed";
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, SegmentDistance,
+    ::testing::Values(SegmentCase{"inside", C2dPos(0, 0), C2dPos(0, 10), C2dPos(3, 4), 3},
+                      SegmentCase{"at start", C2dPos(0, 0), C2dPos(0, 10), C2dPos(-2, 0), 2},
+                      SegmentCase{"at end", C2dPos(0, 0), C2dPos(0, 10), C2dPos(2, 10), 2},
+                      SegmentCase{"beyond end", C2dPos(0, 0), C2dPos(0, 10), C2dPos(4, 13), 5},
+                      SegmentCase{"before start", C2dPos(0, 0), C2dPos(0, 10), C2dPos(-3, -4), 5},
+                      SegmentCase{"on the line", C2dPos(1, 1), C2dPos(4, 5), C2dPos(2.5, 3), 0},
+                      SegmentCase{"coincident ends", C2dPos(1, 1), C2dPos(1, 1), C2dPos(4, 5), 5},
+                      SegmentCase{"skew", C2dPos(0, 0), C2dPos(10, 10), C2dPos(0, 10), std::sqrt(50.0)}));
+
+}  // namespace
