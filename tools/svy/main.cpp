@@ -14,6 +14,11 @@ int main(int argc, char** argv) {
   app.add_flag("--json", "Write a JSON array of objects instead of CSV");
   app.add_flag("--full-precision", "Write numbers with 17 significant digits (they read back exactly)");
 
+  registerCogoVerbs(app);
+  registerAngleVerbs(app);
+  registerStationVerbs(app);
+  registerUnitsVerbs(app);
+
   try {
     app.parse(argc, argv);
   } catch (const CLI::CallForHelp& e) {

@@ -6,3 +6,7 @@ namespace CLI {
 class App;
 }
 
+void registerCogoVerbs(CLI::App& app);
+void registerAngleVerbs(CLI::App& app);
+void registerStationVerbs(CLI::App& app);
+void registerUnitsVerbs(CLI::App& app);
