@@ -1,0 +1,362 @@
+// Spiral curve data in the element frame: every combination of law, direction of travel, side and partial
+// or full spiral checked against its own heading (positions integrate it, curvature is its derivative),
+// the projection and chord-step round trips, and published clothoid tables for partial spirals.
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+#include <string>
+
+#include "support/refdata.h"
+#include "svymath/curves/curve_data_spiral.h"
+#include "svymath/curves/spiral_cubic.h"
+#include "svymath/foundation/constants.h"
+#include "svyutils/svy_err_log.h"
+#include "test_spiral_support.h"
+
+namespace {
+
+using svy_math::units::kDegToRad;
+
+struct SpiralCase {
+  AlntMathSpiralType type;
+  bool tssc;
+  bool right;
+  double length;
+  double r1;  // full spiral: the radius; partial: the radius at one end
+  double r2;  // 0 for a full spiral
+};
+
+std::string describe(const SpiralCase& c) {
+  return std::string(c.type == eMathSpiralEuler ? "clothoid" : "cubic") + (c.tssc ? " TS-SC" : " CS-ST") +
+         (c.right ? " right" : " left") + " L " + std::to_string(c.length) + " R " + std::to_string(c.r1) + "/" +
+         std::to_string(c.r2);
+}
+
+bool define(const SpiralCase& c, CCurveDataSpiral& data) {
+  data.resetType(c.type);
+  if (c.r2 == 0.0) return data.setLenAndR(c.length, c.r1, c.right, c.tssc);
+  return data.setLenAndTwoR(c.length, c.r1, c.r2, c.right, c.tssc);
+}
+
+// The clothoid is exact to the Fresnel integrals; the cubic's series and its coefficient search leave it
+// about 1e-7 m from its own heading for these flat cases.
+double positionTol(const SpiralCase& c) { return c.type == eMathSpiralEuler ? 1e-9 : 2e-7; }
+
+class SpiralData : public ::testing::TestWithParam<SpiralCase> {
+ protected:
+  void SetUp() override { ASSERT_TRUE(define(GetParam(), data_)) << describe(GetParam()); }
+  double headingRad(double s) const { return data_.GetAzimuth(s) * kDegToRad; }
+  CCurveDataSpiral data_;
+};
+
+TEST_P(SpiralData, PositionsIntegrateHeading) {
+  const SpiralCase c = GetParam();
+  EXPECT_NEAR(data_.getTotalLength(), c.length, 1e-9);
+  double n = 1.0, e = 1.0;
+  ASSERT_TRUE(data_.getPosAtLength(0.0, n, e));
+  EXPECT_NEAR(n, 0.0, 1e-12);
+  EXPECT_NEAR(e, 0.0, 1e-12);
+  EXPECT_NEAR(data_.GetAzimuth(0.0), 0.0, 1e-12);
+  for (double f : {0.2, 0.5, 0.77, 1.0}) {
+    const double s = f * c.length;
+    double refN = 0.0, refE = 0.0;
+    spiral_test::integrateHeading([&](double u) { return headingRad(u); }, s, 1e-12, refN, refE);
+    ASSERT_TRUE(data_.getPosAtLength(s, n, e));
+    EXPECT_NEAR(n, refN, positionTol(c)) << describe(c) << " s " << s;
+    EXPECT_NEAR(e, refE, positionTol(c)) << describe(c) << " s " << s;
+    // The element turns to its side all along.
+    EXPECT_EQ(e > 0.0, c.right) << describe(c);
+    EXPECT_EQ(data_.GetAzimuth(s) > 0.0, c.right) << describe(c);
+  }
+  EXPECT_NEAR(data_.getFinalNorthing(), n, 1e-12);
+  EXPECT_NEAR(data_.getFinalEasting(), e, 1e-12);
+  EXPECT_NEAR(data_.getFinalAzimutInRad(), headingRad(c.length), 1e-12);
+}
+
+TEST_P(SpiralData, CurvatureIsDerivativeOfHeading) {
+  const SpiralCase c = GetParam();
+  const double h = 1e-3;
+  for (double f : {0.1, 0.5, 0.9}) {
+    const double s = f * c.length;
+    const double numeric = (headingRad(s + h) - headingRad(s - h)) / (2.0 * h);
+    const double k = data_.getCurvatureAtLength(s);
+    EXPECT_NEAR(k, numeric, 1e-8 * std::fabs(k) + 1e-11) << describe(c) << " s " << s;
+  }
+  // The ends: the radii the element reports are those of its curvature there.
+  const double kStart = data_.getCurvatureAtLength(0.0);
+  const double kEnd = data_.getCurvatureAtLength(c.length);
+  const double rStart = data_.getStartRadius();
+  const double rEnd = data_.getFinalRadius();
+  EXPECT_NEAR(rStart == 0.0 ? 0.0 : 1.0 / rStart, kStart, 1e-9 * std::fabs(kStart) + 1e-12) << describe(c);
+  EXPECT_NEAR(rEnd == 0.0 ? 0.0 : 1.0 / rEnd, kEnd, 1e-9 * std::fabs(kEnd) + 1e-12) << describe(c);
+  // Curvature grows towards the curve: along a TS-SC element, against a CS-ST one.
+  EXPECT_EQ(std::fabs(kEnd) > std::fabs(kStart), c.tssc) << describe(c);
+  EXPECT_EQ(data_.isToTheRight(), c.right);
+  EXPECT_EQ(data_.isToTheLeft(), !c.right);
+  EXPECT_EQ(data_.getRadius() > 0.0, c.right);
+  EXPECT_EQ(data_.isCompoundSpiral(), c.r2 != 0.0);
+  if (c.r2 != 0.0) {
+    const double flat = std::fmax(c.r1, c.r2);
+    const double sharp = std::fmin(c.r1, c.r2);
+    EXPECT_NEAR(std::fabs(c.tssc ? rStart : rEnd), flat, 1e-5 * flat) << describe(c);
+    EXPECT_NEAR(std::fabs(c.tssc ? rEnd : rStart), sharp, 1e-6 * sharp) << describe(c);
+  }
+}
+
+TEST_P(SpiralData, ProjectionRecoversLengthAndOffset) {
+  const SpiralCase c = GetParam();
+  for (double f : {0.0, 0.3, 0.62, 1.0}) {
+    for (double offset : {-4.0, 0.0, 2.5}) {
+      const double s = f * c.length;
+      double n = 0.0, e = 0.0;
+      ASSERT_TRUE(data_.getPosAtLength(s, n, e));
+      // A point on the normal at s; at the ends only points beside the element project there.
+      const double az = headingRad(s);
+      const double pn = n - offset * std::sin(az);
+      const double pe = e + offset * std::cos(az);
+      double dist = 0.0, len = 0.0;
+      ASSERT_TRUE(data_.getShortestDistAndCurveLen(pn, pe, dist, len));
+      EXPECT_NEAR(len, s, 1e-6) << describe(c) << " s " << s << " offset " << offset;
+      EXPECT_NEAR(dist, offset, 1e-9) << describe(c) << " s " << s << " offset " << offset;
+    }
+  }
+  // A point before the start projects onto the start, a point beyond the end onto the end.
+  double dist = 0.0, len = 1.0;
+  ASSERT_TRUE(data_.getShortestDistAndCurveLen(-10.0, 0.0, dist, len));
+  EXPECT_EQ(len, 0.0);
+  EXPECT_NEAR(std::fabs(dist), 10.0, 1e-9);
+}
+
+TEST_P(SpiralData, StepKeepsChordWithinDeviation) {
+  const SpiralCase c = GetParam();
+  for (double dev : {0.001, 0.05}) {
+    double s = 0.0;
+    int steps = 0;
+    while (s < c.length && steps < 10000) {
+      const double step = data_.getStepForDeviation(s, dev);
+      ASSERT_GT(step, 0.0) << describe(c) << " s " << s;
+      ASSERT_LE(s + step, c.length + 1e-9);
+      // The largest distance of the element from the chord between s and s + step.
+      double n0 = 0.0, e0 = 0.0, n1 = 0.0, e1 = 0.0;
+      ASSERT_TRUE(data_.getPosAtLength(s, n0, e0));
+      ASSERT_TRUE(data_.getPosAtLength(s + step, n1, e1));
+      const double chord = std::hypot(n1 - n0, e1 - e0);
+      double worst = 0.0;
+      for (int i = 1; i < 16; ++i) {
+        double n = 0.0, e = 0.0;
+        ASSERT_TRUE(data_.getPosAtLength(s + step * i / 16.0, n, e));
+        worst = std::fmax(worst, std::fabs((n1 - n0) * (e - e0) - (e1 - e0) * (n - n0)) / chord);
+      }
+      EXPECT_LE(worst, dev) << describe(c) << " s " << s;
+      s += step;
+      ++steps;
+    }
+    EXPECT_GE(s, c.length - 1e-9);
+    EXPECT_GT(steps, 1) << describe(c) << " dev " << dev;
+  }
+  // No deviation given: the rest of the element.
+  EXPECT_NEAR(data_.getStepForDeviation(0.25 * c.length, 0.0), 0.75 * c.length, 1e-9);
+}
+
+TEST_P(SpiralData, TurningToOtherSideMirrors) {
+  const SpiralCase c = GetParam();
+  CCurveDataSpiral mirrored(data_);
+  ASSERT_TRUE(mirrored.setTurnRight(!c.right));
+  EXPECT_NEAR(mirrored.getTotalLength(), c.length, 1e-9);
+  for (double f : {0.3, 1.0}) {
+    double n = 0.0, e = 0.0, nm = 0.0, em = 0.0;
+    ASSERT_TRUE(data_.getPosAtLength(f * c.length, n, e));
+    ASSERT_TRUE(mirrored.getPosAtLength(f * c.length, nm, em));
+    EXPECT_NEAR(nm, n, 1e-6);
+    EXPECT_NEAR(em, -e, 1e-6);
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, SpiralData,
+    ::testing::Values(SpiralCase{eMathSpiralEuler, true, true, 100.0, 300.0, 0.0},
+                      SpiralCase{eMathSpiralEuler, false, true, 100.0, 300.0, 0.0},
+                      SpiralCase{eMathSpiralEuler, true, false, 80.0, 450.0, 0.0},
+                      SpiralCase{eMathSpiralEuler, false, false, 80.0, 450.0, 0.0},
+                      SpiralCase{eMathSpiralEuler, true, true, 100.0, 1000.0, 300.0},
+                      SpiralCase{eMathSpiralEuler, false, false, 100.0, 1000.0, 300.0},
+                      SpiralCase{eMathSpiralEuler, false, true, 60.0, 250.0, 900.0},
+                      SpiralCase{eMathSpiralCubic, true, true, 100.0, 400.0, 0.0},
+                      SpiralCase{eMathSpiralCubic, false, false, 100.0, 400.0, 0.0},
+                      SpiralCase{eMathSpiralCubic, true, false, 60.0, 1000.0, 350.0},
+                      SpiralCase{eMathSpiralCubic, false, true, 60.0, 1000.0, 350.0}));
+
+TEST(SpiralDataDirection, CurveToTangentStartsOnTheCurve) {
+  CCurveDataSpiral1R out;
+  ASSERT_TRUE(out.setLenAndR(90.0, 350.0, true, false));
+  EXPECT_TRUE(out.isCSST());
+  double n = 1.0, e = 1.0;
+  ASSERT_TRUE(out.getPosAtLength(0.0, n, e));
+  EXPECT_NEAR(n, 0.0, 1e-12);
+  EXPECT_NEAR(e, 0.0, 1e-12);
+  EXPECT_NEAR(out.getCurvatureAtLength(0.0), 1.0 / 350.0, 1e-15);
+  EXPECT_EQ(out.getCurvatureAtLength(90.0), 0.0);
+  EXPECT_NEAR(out.getRadius(), 350.0, 1e-12);
+  // It is the entry spiral run backwards: the chord and the total turn agree.
+  CCurveDataSpiral1R in;
+  ASSERT_TRUE(in.setLenAndR(90.0, 350.0, true, true));
+  EXPECT_NEAR(std::hypot(out.getFinalNorthing(), out.getFinalEasting()),
+              std::hypot(in.getFinalNorthing(), in.getFinalEasting()), 1e-9);
+  EXPECT_NEAR(out.getFinalAzimutInRad(), in.getFinalAzimutInRad(), 1e-12);
+  // The length at which the exit spiral has turned by half its total turn lies in its first half.
+  CMathAngle half;
+  half.setRad(0.5 * out.getFinalAzimutInRad());
+  const double s = out.getLengthAtAzimuth(half);
+  EXPECT_NEAR(out.GetAzimuth(s) * kDegToRad, half.getRad(), 1e-9);
+  EXPECT_LT(s, 45.0);
+}
+
+TEST(SpiralDataRange, SnapsOneMillimetreAndLogsBeyond) {
+  CCurveDataSpiral part;
+  ASSERT_TRUE(part.setLenAndTwoR(100.0, 1000.0, 300.0, true, true));
+  double endN = 0.0, endE = 0.0;
+  ASSERT_TRUE(part.getPosAtLength(100.0, endN, endE));
+  svy_logging::CScopedErrLogCapture capture;
+  double n = 0.0, e = 0.0;
+  ASSERT_TRUE(part.getPosAtLength(100.0009, n, e));
+  EXPECT_EQ(n, endN);
+  EXPECT_EQ(e, endE);
+  EXPECT_EQ(capture.count(), 0u);
+  EXPECT_FALSE(part.getPosAtLength(100.0011, n, e));
+  EXPECT_EQ(part.getStepForDeviation(100.0011, 0.01), 0.0);
+  EXPECT_EQ(capture.count(), 2u);
+  EXPECT_EQ(capture.entries()[0].file, "mathCurves");
+}
+
+TEST(SpiralDataUndefined, FailsWithoutHanging) {
+  CCurveDataSpiral data;
+  EXPECT_FALSE(data.isok());
+  svy_logging::CScopedErrLogCapture capture;
+  double n = 0.0, e = 0.0, dist = 0.0, len = 0.0;
+  EXPECT_FALSE(data.getPosAtLength(0.0, n, e));
+  EXPECT_FALSE(data.getShortestDistAndCurveLen(1.0, 1.0, dist, len));
+  EXPECT_EQ(data.getCurvatureAtLength(1.0), 0.0);
+  EXPECT_TRUE(std::isnan(data.getFinalNorthing()));
+  EXPECT_FALSE(data.setTurnRight(true));
+  EXPECT_FALSE(data.setLenAndTwoR(50.0, 0.0, std::numeric_limits<double>::infinity(), true, true));
+  const double inf = std::numeric_limits<double>::infinity();
+  for (double x : {std::nan(""), inf, -inf, 1e300, 0.0}) {
+    data.setLenAndTwoR(x, 1000.0, 300.0, true, true);
+    data.setLenAndTwoR(100.0, x, 300.0, false, false);
+    data.getShortestDistAndCurveLen(x, 1.0, dist, len);
+    data.getStepForDeviation(x, 0.01);
+    ASSERT_TRUE(data.setLenAndR(100.0, 300.0, true, true));
+    data.getStepForDeviation(50.0, x);
+    data.getShortestDistAndCurveLen(x, x, dist, len);
+    data.getPosAtLength(x, n, e);
+  }
+  EXPECT_GT(capture.count(), 0u);
+}
+
+TEST(SpiralDataTangentEnd, TwoRadiiWithTangentGiveFullSpiral) {
+  CCurveDataSpiral part;
+  ASSERT_TRUE(part.setLenAndTwoR(100.0, std::numeric_limits<double>::infinity(), 300.0, true, true));
+  EXPECT_FALSE(part.isCompoundSpiral());
+  CCurveDataSpiral1R full;
+  ASSERT_TRUE(full.setLenAndR(100.0, 300.0, true, true));
+  EXPECT_EQ(part.getFinalNorthing(), full.getFinalNorthing());
+  EXPECT_EQ(part.getFinalEasting(), full.getFinalEasting());
+  EXPECT_EQ(part.getStartRadius(), 0.0);
+  EXPECT_EQ(part.getFinalRadius(), 300.0);
+  // An explicit start offset cuts the same part as the radii would.
+  CCurveDataSpiral byRadii;
+  ASSERT_TRUE(byRadii.setLenAndTwoR(60.0, 500.0, 300.0, true, true));
+  CCurveDataSpiral byOffset;
+  ASSERT_TRUE(byOffset.setLenAndR(byRadii.getSimpleSpiral()->getLength(), 300.0, true, true));
+  ASSERT_TRUE(byOffset.setStartOffset(byRadii.getStartOffset()));
+  EXPECT_FALSE(byOffset.setStartOffset(1e6));
+  EXPECT_NEAR(byOffset.getFinalNorthing(), byRadii.getFinalNorthing(), 1e-12);
+  EXPECT_NEAR(byOffset.getFinalEasting(), byRadii.getFinalEasting(), 1e-12);
+}
+
+TEST(SpiralDataCopy, CopiesOwnTheirLaw) {
+  CCurveDataSpiral a(eMathSpiralCubic);
+  ASSERT_TRUE(a.setLenAndR(100.0, 300.0, true, true));
+  CCurveDataSpiral b(a);
+  CCurveDataSpiral c;
+  c = a;
+  ASSERT_TRUE(a.setLenAndR(50.0, 600.0, false, false));
+  EXPECT_NE(b.getSimpleSpiral(), a.getSimpleSpiral());
+  EXPECT_EQ(b.getTotalLength(), 100.0);
+  EXPECT_EQ(c.getTotalLength(), 100.0);
+  EXPECT_EQ(c.getSpiralMathType(), eMathSpiralCubic);
+  c = c;
+  EXPECT_EQ(c.getTotalLength(), 100.0);
+  // A new law keeps the definition.
+  ASSERT_TRUE(b.recreateSimpleSpiral(eMathSpiralEuler));
+  EXPECT_EQ(b.getSpiralMathType(), eMathSpiralEuler);
+  EXPECT_EQ(b.getTotalLength(), 100.0);
+  EXPECT_EQ(b.getRadius(), 300.0);
+  EXPECT_TRUE(b.isTSSC());
+}
+
+TEST(SpiralDataFlags, EntryFormsRoundTripAndHostBitsStay) {
+  CCurveDataSpiral1R data;
+  data.setFlags(0xF000000Fu);
+  ASSERT_TRUE(data.setLenAndR(120.0, eLengthDisplayChord, 500.0, eRadiusDisplaySpiralParameter, false, true));
+  double length = 0.0, radius = 0.0;
+  bool right = true, tssc = false;
+  AlntElementLengthDisplay lengthDisplay = eLengthDisplayArc;
+  AlntElementRadiusDisplay radiusDisplay = eRadiusDisplayRadius;
+  ASSERT_TRUE(data.GetSpiralElement(length, lengthDisplay, radius, radiusDisplay, right, tssc));
+  EXPECT_EQ(length, 120.0);
+  EXPECT_EQ(radius, -500.0);
+  EXPECT_FALSE(right);
+  EXPECT_TRUE(tssc);
+  EXPECT_EQ(lengthDisplay, eLengthDisplayChord);
+  EXPECT_EQ(radiusDisplay, eRadiusDisplaySpiralParameter);
+  EXPECT_EQ(data.getFlags() & 0xF000000Fu, 0xF000000Fu);
+  EXPECT_NEAR(data.getSpiralParam(), std::sqrt(120.0 * 500.0), 1e-12);
+  EXPECT_EQ(CCurveDataSpiral1R::static_type(), 2);
+}
+
+// Published partial clothoids (curvature linear in length from R1 to R2 over 100 m), in the other
+// convention: x along the start tangent, y to the left, positive radius turning left.
+struct PublishedCase {
+  const char* file;
+  double r1;  // radius at the start, that convention's sign; infinity for the tangent
+  double r2;  // radius at the end
+};
+
+class PublishedClothoid : public ::testing::TestWithParam<PublishedCase> {};
+
+TEST_P(PublishedClothoid, MatchesTable) {
+  SVY_SKIP_WITHOUT_REFDATA();
+  const PublishedCase c = GetParam();
+  const auto rows = spiral_test::readNumericTable(
+      svy_test::refdataPath("alignment/ifc-rail-unit-test-reference-code/DomainExpert/HorizontalAlignment/"
+                            "Clothoid/") + c.file,
+      0);
+  ASSERT_EQ(rows.size(), 101u) << c.file;
+  const bool toTheRight = c.r1 < 0.0 || c.r2 < 0.0;
+  const bool tssc = std::fabs(c.r2) < std::fabs(c.r1);
+  CCurveDataSpiral data;
+  ASSERT_TRUE(data.setLenAndTwoR(100.0, c.r1, c.r2, toTheRight, tssc)) << c.file;
+  for (const auto& row : rows) {
+    double n = 0.0, e = 0.0;
+    ASSERT_TRUE(data.getPosAtLength(row[0], n, e));
+    EXPECT_NEAR(n, row[1], 1e-9) << c.file << " s " << row[0];
+    EXPECT_NEAR(e, -row[2], 1e-9) << c.file << " s " << row[0];
+  }
+}
+
+constexpr double kInf = std::numeric_limits<double>::infinity();
+
+INSTANTIATE_TEST_SUITE_P(
+    Files, PublishedClothoid,
+    ::testing::Values(PublishedCase{"Clothoid_100.0_1000_300_1_Meter.txt", 1000.0, 300.0},
+                      PublishedCase{"Clothoid_100.0_300_1000_1_Meter.txt", 300.0, 1000.0},
+                      PublishedCase{"Clothoid_100.0_-1000_-300_1_Meter.txt", -1000.0, -300.0},
+                      PublishedCase{"Clothoid_100.0_-300_-1000_1_Meter.txt", -300.0, -1000.0},
+                      PublishedCase{"Clothoid_100.0_inf_300_1_Meter.txt", kInf, 300.0},
+                      PublishedCase{"Clothoid_100.0_300_inf_1_Meter.txt", 300.0, kInf},
+                      PublishedCase{"Clothoid_100.0_-inf_-300_1_Meter.txt", -kInf, -300.0},
+                      PublishedCase{"Clothoid_100.0_-300_-inf_1_Meter.txt", -300.0, -kInf}));
+
+}  // namespace
