@@ -1,0 +1,171 @@
+// Straight-line mathematics: extent test, position and length-and-offset round trips, the prolonged-line
+// distance, axis-parallel helpers.
+#include <gtest/gtest.h>
+
+#include <cmath>
+
+#include "svymath/curves/generic_line_impl.h"
+#include "test_curve_primitives_support.h"
+
+namespace {
+
+using curve_test::azimuthDeg;
+
+struct ExtentCase {
+  EIntersectionType type;
+  double along;
+  bool onLine;
+};
+
+class LineExtentTest : public ::testing::TestWithParam<ExtentCase> {};
+
+TEST_P(LineExtentTest, AcceptsLengthsByIntersectionType) {
+  const ExtentCase& c = GetParam();
+  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(0.0, 100.0), c.type);
+  EXPECT_EQ(line.checkDistanceAlongIsOnLine(c.along), c.onLine) << "along " << c.along;
+  // The same rule decides whether a point beside the line gets a length.
+  double length = -7.0;
+  double offset = -7.0;
+  EXPECT_EQ(line.getLengthAndOffset(C2dPos(3.0, c.along), length, offset), c.onLine);
+  if (c.onLine) {
+    // The direction east is pi/2 rounded to a double: its cosine leaves 6e-17 of the along distance across.
+    const double tolerance = 1e-12 + 1e-16 * std::fabs(c.along);
+    EXPECT_NEAR(length, c.along, tolerance);
+    EXPECT_NEAR(offset, -3.0, tolerance);  // north of an eastward line is its left
+  } else {
+    EXPECT_EQ(length, -7.0);
+    EXPECT_EQ(offset, -7.0);
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Table, LineExtentTest,
+    ::testing::Values(ExtentCase{eIntersectOnSegment, -0.0005, false}, ExtentCase{eIntersectOnSegmentTol, -0.0005, true},
+                      ExtentCase{eIntersectUnbounded, -0.0005, true}, ExtentCase{eIntersectOnSegment, 0.0, true},
+                      ExtentCase{eIntersectOnSegment, 100.0, true}, ExtentCase{eIntersectOnSegmentTol, 100.0009, true},
+                      ExtentCase{eIntersectOnSegmentTol, 100.0011, false}, ExtentCase{eIntersectOnSegmentTol, -0.002, false},
+                      ExtentCase{eIntersectUnbounded, -1e6, true}, ExtentCase{eIntersectUnbounded, 1e9, true},
+                      ExtentCase{eIntersectOnSegment, 50.0, true}));
+
+struct RoundTripCase {
+  double north;
+  double east;
+  double azDeg;
+  double length;
+  double offset;
+};
+
+class LineRoundTripTest : public ::testing::TestWithParam<RoundTripCase> {};
+
+TEST_P(LineRoundTripTest, PositionThenLengthAndOffsetGivesThemBack) {
+  const RoundTripCase& c = GetParam();
+  const CGenericLineImpl line(C2dPos(c.north, c.east), azimuthDeg(c.azDeg), 250.0, eIntersectOnSegment);
+  C2dPos pos;
+  ASSERT_TRUE(line.getPosAtLengthAndOffset(c.length, c.offset, pos));
+  // Independent check of the axis convention: offset to the right of azimuth a is (-sin a, cos a).
+  const double a = c.azDeg * svy_math::units::kDegToRad;
+  EXPECT_NEAR(pos.north(), c.north + c.length * std::cos(a) - c.offset * std::sin(a), 1e-8);
+  EXPECT_NEAR(pos.east(), c.east + c.length * std::sin(a) + c.offset * std::cos(a), 1e-8);
+  double length = 0.0;
+  double offset = 0.0;
+  ASSERT_TRUE(line.getLengthAndOffset(pos, length, offset));
+  EXPECT_NEAR(length, c.length, 1e-8);
+  EXPECT_NEAR(offset, c.offset, 1e-8);
+  double distance = 0.0;
+  ASSERT_TRUE(line.getShortestDistanceToPoint(pos, distance));
+  EXPECT_NEAR(distance, std::fabs(c.offset), 1e-8);
+}
+
+INSTANTIATE_TEST_SUITE_P(Table, LineRoundTripTest,
+                         ::testing::Values(RoundTripCase{0.0, 0.0, 0.0, 10.0, 2.5}, RoundTripCase{0.0, 0.0, 90.0, 0.0, -4.0},
+                                           RoundTripCase{10.0, -5.0, 180.0, 250.0, 1.0},
+                                           RoundTripCase{0.0, 0.0, -90.0, 125.0, 0.0},
+                                           RoundTripCase{5000000.0, 500000.0, 37.25, 77.7, -12.3},
+                                           RoundTripCase{-300.0, 42.0, 271.5, 200.0, 1000.0}));
+
+TEST(GenericLine, LineFromPointAndAzimuthIsThousandLongAndUnbounded) {
+  const CGenericLineImpl line(C2dPos(100.0, 200.0), azimuthDeg(90.0));
+  EXPECT_EQ(line.getIntersectionType(), eIntersectUnbounded);
+  EXPECT_NEAR(line.getTotalLength(), 1000.0, 1e-9);
+  EXPECT_NEAR(line.getEndNorthing(), 100.0, 1e-9);
+  EXPECT_NEAR(line.getEndEasting(), 1200.0, 1e-9);
+  double length = 0.0;
+  double offset = 0.0;
+  EXPECT_TRUE(line.getLengthAndOffset(C2dPos(100.0, -5000.0), length, offset));
+  EXPECT_NEAR(length, -5200.0, 1e-9);
+}
+
+TEST(GenericLine, DefaultIsZeroLineOnSegment) {
+  const CGenericLineImpl line;
+  EXPECT_EQ(line.getIntersectionType(), eIntersectOnSegment);
+  EXPECT_TRUE(line.isok());
+  EXPECT_EQ(line.getTotalLength(), 0.0);
+  EXPECT_EQ(line.getAzimuthAtLength(0.0), 0.0);
+}
+
+TEST(GenericLine, TinyAlongAndOffsetComeBackAsExactZero) {
+  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(100.0, 0.0));
+  double length = 1.0;
+  double offset = 1.0;
+  ASSERT_TRUE(line.getLengthAndOffset(C2dPos(1e-13, 5e-13), length, offset));
+  EXPECT_EQ(length, 0.0);
+  EXPECT_EQ(offset, 0.0);
+  EXPECT_FALSE(std::signbit(offset));
+}
+
+TEST(GenericLine, ShortestDistanceUsesTheProlongedLineBeyondTheEnd) {
+  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(100.0, 0.0));
+  double distance = 0.0;
+  ASSERT_TRUE(line.getShortestDistanceToPoint(C2dPos(500.0, -3.0), distance));
+  EXPECT_NEAR(distance, 3.0, 1e-12);  // not the 400.01 m to the end point
+  double length = 0.0;
+  double offset = 0.0;
+  EXPECT_FALSE(line.getLengthAndOffset(C2dPos(500.0, -3.0), length, offset));
+}
+
+TEST(GenericLine, AzimuthCurvatureAndStep) {
+  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(-10.0, -10.0));
+  EXPECT_NEAR(line.getAzimuthAtLength(3.0), -135.0, 1e-12);
+  CMathAngle start;
+  CMathAngle end;
+  ASSERT_TRUE(line.getStartAzimut(start));
+  ASSERT_TRUE(line.getEndAzimut(end));
+  EXPECT_EQ(start, end);
+  EXPECT_EQ(line.getCurvatureAtLength(1.0), 0.0);
+  EXPECT_NEAR(line.getStepForDeviation(4.0, 0.001), std::sqrt(200.0) - 4.0, 1e-12);
+  C2dPos next;
+  EXPECT_NEAR(line.getNextPosForDeviation(4.0, 0.001, next), std::sqrt(200.0), 1e-12);
+  EXPECT_NEAR(next.north(), -10.0, 1e-12);
+  EXPECT_NEAR(next.east(), -10.0, 1e-12);
+  const C2dMinMax box = line.getBoundary();
+  EXPECT_EQ(box.minNorth, -10.0);
+  EXPECT_EQ(box.maxEast, 0.0);
+  EXPECT_FALSE(box.empty);
+}
+
+TEST(GenericLine, AxisCrossingsAndInterpolation) {
+  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(10.0, 20.0));
+  C2dPos pos;
+  ASSERT_TRUE(line.calcHorizontalIntersection(5.0, pos));
+  EXPECT_NEAR(pos.east(), 10.0, 1e-12);
+  ASSERT_TRUE(line.calcVerticalIntersection(4.0, pos));
+  EXPECT_NEAR(pos.north(), 2.0, 1e-12);
+  EXPECT_FALSE(line.calcHorizontalIntersection(11.0, pos));  // beyond the end
+  double value = 0.0;
+  ASSERT_TRUE(line.interpolateNorthing(30.0, value));  // the prolonged line
+  EXPECT_NEAR(value, 15.0, 1e-12);
+  ASSERT_TRUE(line.interpolateEasting(-1.0, value));
+  EXPECT_NEAR(value, -2.0, 1e-12);
+  EXPECT_TRUE(line.checkNorthIsOnLine(10.0));
+  EXPECT_FALSE(line.checkEastIsOnLine(20.5));
+
+  const CGenericLineImpl northSouth(C2dPos(0.0, 7.0), C2dPos(10.0, 7.0));
+  EXPECT_TRUE(northSouth.isLineWithSameEasting());
+  EXPECT_FALSE(northSouth.isLineWithSameNorthing());
+  EXPECT_FALSE(northSouth.calcVerticalIntersection(7.0, pos));
+  EXPECT_FALSE(northSouth.interpolateNorthing(7.0, value));
+  EXPECT_TRUE(northSouth.checkEastIsOnLine(7.0));
+  EXPECT_FALSE(northSouth.checkEastIsOnLine(7.1));
+}
+
+}  // namespace

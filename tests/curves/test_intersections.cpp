@@ -1,0 +1,275 @@
+// Crossings of every pair of segment kinds through the double dispatch: each found point must lie on both
+// pieces (checked with their own distance queries), the dispatch must not depend on the order of the pair,
+// and misses, tangencies, parallels and extents must behave.
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cmath>
+
+#include "svymath/curves/generic_line_impl.h"
+#include "svymath/curves/generic_segment_visitor.h"
+#include "svymath/curves/tline.h"
+#include "test_curve_primitives_support.h"
+
+namespace {
+
+using curve_test::makeArc;
+using curve_test::makeSegment;
+using curve_test::makeSpiral;
+
+svy_vector<C2dPos> crossings(const CGenericSegment& a, const CGenericSegment& b) {
+  svy_vector<C2dPos> out;
+  a.calcIntersections(b, out);
+  return out;
+}
+
+// Same points, in any order.
+void expectSamePoints(svy_vector<C2dPos> a, svy_vector<C2dPos> b, double tolerance) {
+  ASSERT_EQ(a.size(), b.size());
+  const auto byNorth = [](const C2dPos& p, const C2dPos& q) { return p.north() < q.north(); };
+  std::sort(a.begin(), a.end(), byNorth);
+  std::sort(b.begin(), b.end(), byNorth);
+  for (std::size_t i = 0; i < a.size(); ++i) {
+    EXPECT_NEAR(a[i].north(), b[i].north(), tolerance);
+    EXPECT_NEAR(a[i].east(), b[i].east(), tolerance);
+  }
+}
+
+struct LineLineCase {
+  C2dPos a0, a1, b0, b1;
+  EIntersectionType type;
+  int hits;
+  C2dPos expected;
+};
+
+class LineLineTest : public ::testing::TestWithParam<LineLineCase> {};
+
+TEST_P(LineLineTest, CrossingsByCase) {
+  const LineLineCase& c = GetParam();
+  const CGenericLineImpl a(c.a0, c.a1, c.type);
+  const svy_math::TLine b(c.b0, c.b1);
+  svy_vector<C2dPos> out(1, C2dPos(-9.0, -9.0));  // results are appended
+  EXPECT_EQ(a.calcIntersections(b, out), c.hits > 0);
+  ASSERT_EQ(out.size(), static_cast<std::size_t>(1 + c.hits));
+  if (c.hits == 1) {
+    EXPECT_NEAR(out[1].north(), c.expected.north(), 1e-9);
+    EXPECT_NEAR(out[1].east(), c.expected.east(), 1e-9);
+  }
+  if (c.type == eIntersectOnSegment) expectSamePoints(crossings(a, b), crossings(b, a), 1e-9);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Table, LineLineTest,
+    ::testing::Values(
+        // general crossing
+        LineLineCase{C2dPos(0, 0), C2dPos(10, 10), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegment, 1, C2dPos(5, 5)},
+        // north-south with east-west, either way round
+        LineLineCase{C2dPos(-5, 2), C2dPos(5, 2), C2dPos(1, -3), C2dPos(1, 3), eIntersectOnSegment, 1, C2dPos(1, 2)},
+        LineLineCase{C2dPos(1, -3), C2dPos(1, 3), C2dPos(-5, 2), C2dPos(5, 2), eIntersectOnSegment, 1, C2dPos(1, 2)},
+        // north-south with a slanted line
+        LineLineCase{C2dPos(0, 4), C2dPos(10, 4), C2dPos(0, 0), C2dPos(8, 8), eIntersectOnSegment, 1, C2dPos(4, 4)},
+        // parallel and collinear
+        LineLineCase{C2dPos(0, 0), C2dPos(10, 10), C2dPos(1, 0), C2dPos(11, 10), eIntersectOnSegment, 0, C2dPos()},
+        LineLineCase{C2dPos(0, 0), C2dPos(10, 0), C2dPos(0, 5), C2dPos(10, 5), eIntersectOnSegment, 0, C2dPos()},
+        // crossing of the prolonged lines only
+        LineLineCase{C2dPos(0, 0), C2dPos(1, 1), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegment, 0, C2dPos()},
+        LineLineCase{C2dPos(0, 0), C2dPos(1, 1), C2dPos(0, 10), C2dPos(10, 0), eIntersectUnbounded, 1, C2dPos(5, 5)},
+        // touching at an end, and just short of it within the tolerance
+        LineLineCase{C2dPos(0, 0), C2dPos(5, 5), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegment, 1, C2dPos(5, 5)},
+        LineLineCase{C2dPos(0, 0), C2dPos(4.9995, 4.9995), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegmentTol, 1,
+                     C2dPos(5, 5)},
+        // survey coordinates
+        LineLineCase{C2dPos(5000000, 500000), C2dPos(5000100, 500100), C2dPos(5000000, 500100),
+                     C2dPos(5000100, 500000), eIntersectOnSegment, 1, C2dPos(5000050, 500050)}));
+
+TEST(LineArcIntersection, TwoCrossingsTangencyMissAndSweep) {
+  const CCurveArc circleArc = makeArc(0.0, 0.0, 0.0, 100.0, 50.0, true);  // centre (0, 50), quarter-ish turn
+  // A north-south line through the centre meets the circle at (50, 50) and (-50, 50); only (50, 50) is in
+  // the arc's sweep, which runs clockwise from west of the centre (the start) to 24.6 degrees.
+  const CGenericLineImpl through(C2dPos(-100.0, 50.0), C2dPos(100.0, 50.0));
+  const svy_vector<C2dPos> hits = crossings(through, circleArc);
+  ASSERT_EQ(hits.size(), 1u);
+  EXPECT_NEAR(hits[0].north(), 50.0, 1e-9);
+  EXPECT_NEAR(hits[0].east(), 50.0, 1e-9);
+  expectSamePoints(hits, crossings(circleArc, through), 1e-12);
+
+  CCurveArc unbounded = circleArc;
+  unbounded.setIntersectionType(eIntersectUnbounded);
+  EXPECT_EQ(crossings(through, unbounded).size(), 2u);
+
+  // The tangent at the start touches once; a line beside it misses.
+  const CGenericLineImpl tangent(C2dPos(-10.0, 0.0), C2dPos(10.0, 0.0));
+  const svy_vector<C2dPos> touch = crossings(tangent, circleArc);
+  ASSERT_EQ(touch.size(), 1u);
+  EXPECT_NEAR(touch[0].north(), 0.0, 1e-6);
+  EXPECT_NEAR(touch[0].east(), 0.0, 1e-9);
+  const CGenericLineImpl beside(C2dPos(-10.0, -0.01), C2dPos(10.0, -0.01));
+  EXPECT_TRUE(crossings(beside, circleArc).empty());
+}
+
+TEST(LineArcIntersection, EveryCrossingLiesOnBothPieces) {
+  for (double az = 0.0; az < 360.0; az += 23.0) {
+    const CCurveArc arc = makeArc(5000000.0, 500000.0, az, 180.0, 75.0, static_cast<int>(az) % 2 == 0);
+    for (double lineAz = 5.0; lineAz < 180.0; lineAz += 31.0) {
+      const CGenericLineImpl line(C2dPos(5000020.0, 500030.0), CMathAngle(lineAz), 400.0, eIntersectUnbounded);
+      for (const C2dPos& p : crossings(line, arc)) {
+        double distance = 0.0;
+        ASSERT_TRUE(arc.getShortestDistanceToPoint(p, distance));
+        EXPECT_NEAR(distance, 0.0, 1e-7);
+        ASSERT_TRUE(line.getShortestDistanceToPoint(p, distance));
+        EXPECT_NEAR(distance, 0.0, 1e-7);
+        double length = 0.0;
+        double offset = 0.0;
+        EXPECT_TRUE(arc.getLengthAndOffset(p, length, offset));
+      }
+    }
+  }
+}
+
+TEST(ArcArcIntersection, TwoCrossingsTangencyAndMiss) {
+  // Two circles of radius 50 with centres 60 apart cross at 40 from the line of centres.
+  const CCurveArc a = makeArc(0.0, -50.0, 0.0, 2.0 * svy_math::units::kPi * 50.0, 50.0, true);   // centre (0, 0)
+  const CCurveArc b = makeArc(0.0, 110.0, 180.0, 2.0 * svy_math::units::kPi * 50.0, 50.0, true);  // centre (0, 60)
+  const svy_vector<C2dPos> hits = crossings(a, b);
+  ASSERT_EQ(hits.size(), 2u);
+  for (const C2dPos& p : hits) {
+    EXPECT_NEAR(p.east(), 30.0, 1e-9);
+    EXPECT_NEAR(std::fabs(p.north()), 40.0, 1e-9);
+  }
+  expectSamePoints(hits, crossings(b, a), 1e-9);
+  // Externally tangent circles (centres 100 apart) touch once; farther apart they miss.
+  const CCurveArc touching = makeArc(0.0, 150.0, 180.0, 2.0 * svy_math::units::kPi * 50.0, 50.0, true);
+  const svy_vector<C2dPos> touch = crossings(a, touching);
+  ASSERT_EQ(touch.size(), 1u);
+  EXPECT_NEAR(touch[0].east(), 50.0, 1e-6);
+  const CCurveArc apart = makeArc(0.0, 151.0, 180.0, 2.0 * svy_math::units::kPi * 50.0, 50.0, true);
+  EXPECT_TRUE(crossings(a, apart).empty());
+  // A short arc of a keeps only the crossing within its sweep.
+  // From west of the centre clockwise through north to 47.5 degrees: (40, 30) lies at 36.9, (-40, 30) at 143.1.
+  const CCurveArc shortArc = makeArc(0.0, -50.0, 0.0, 120.0, 50.0, true);
+  const svy_vector<C2dPos> one = crossings(shortArc, b);
+  ASSERT_EQ(one.size(), 1u);
+  EXPECT_NEAR(one[0].north(), 40.0, 1e-9);
+}
+
+// Spiral crossings come from the 20-arc approximation: each hit lies on one of the cached arcs and, to the
+// accuracy of that approximation, on the spiral.
+TEST(SpiralIntersection, CrossingsLieOnTheApproximatingArcs) {
+  const CCurveSpiral spiral = makeSpiral(100.0, 200.0, 30.0, 120.0, 150.0, true, true);
+  svy_vector<CCurveArc> cache;
+  ASSERT_TRUE(spiral.createCache(cache));
+  ASSERT_EQ(cache.size(), static_cast<std::size_t>(CGenericSpiral::kCacheArcs));
+  const auto nearestCacheArc = [&](const C2dPos& p) {
+    double best = 1e9;
+    for (const CCurveArc& arc : cache) {
+      double length = 0.0;
+      double offset = 0.0;
+      if (arc.getLengthAndOffset(p, length, offset)) best = std::min(best, std::fabs(offset));
+    }
+    return best;
+  };
+  int total = 0;
+  for (double across = 5.0; across < 120.0; across += 9.0) {
+    C2dPos on;
+    ASSERT_TRUE(spiral.getPosAtLength(across, on));
+    CMathAngle tangent;
+    ASSERT_TRUE(spiral.getAzimuthAtLength(across, tangent));
+    const CMathAngle normal = tangent + CMathAngle(90.0);
+    const CGenericLineImpl crossing(C2dPos(on.north() - 10.0 * normal.getCos(), on.east() - 10.0 * normal.getSin()),
+                                    normal, 20.0, eIntersectOnSegment);
+    const svy_vector<C2dPos> hits = crossings(spiral, crossing);
+    ASSERT_EQ(hits.size(), 1u) << across;
+    expectSamePoints(hits, crossings(crossing, spiral), 1e-12);
+    EXPECT_LT(nearestCacheArc(hits[0]), 1e-8);
+    double distance = 0.0;
+    ASSERT_TRUE(spiral.getShortestDistanceToPoint(hits[0], distance));
+    EXPECT_LT(distance, 1e-4);  // the approximation's own error, far below a millimetre here
+    ++total;
+  }
+  EXPECT_GT(total, 10);
+}
+
+TEST(SpiralIntersection, SpiralWithArcAndSpiralWithSpiral) {
+  const CCurveSpiral spiral = makeSpiral(0.0, 0.0, 0.0, 100.0, 200.0, true, true);
+  const CCurveArc arc = makeArc(50.0, -30.0, 90.0, 80.0, 500.0, false);  // eastward, gently left
+  const svy_vector<C2dPos> withArc = crossings(spiral, arc);
+  ASSERT_EQ(withArc.size(), 1u);
+  expectSamePoints(withArc, crossings(arc, spiral), 1e-12);
+  double distance = 0.0;
+  ASSERT_TRUE(arc.getShortestDistanceToPoint(withArc[0], distance));
+  EXPECT_NEAR(distance, 0.0, 1e-8);
+  ASSERT_TRUE(spiral.getShortestDistanceToPoint(withArc[0], distance));
+  EXPECT_LT(distance, 1e-4);
+
+  // The mirror image about the north axis meets the spiral only near the shared start; the approximating
+  // arcs start slightly off the spirals' tangent, so their lens may add a second hit a little further on.
+  const CCurveSpiral mirror = makeSpiral(0.0, 0.0, 0.0, 100.0, 200.0, false, true);
+  const CCurveSpiral across = makeSpiral(60.0, -20.0, 80.0, 60.0, 100.0, true, true);
+  const svy_vector<C2dPos> hits = crossings(spiral, across);
+  ASSERT_FALSE(hits.empty());
+  for (const C2dPos& p : hits) {
+    ASSERT_TRUE(spiral.getShortestDistanceToPoint(p, distance));
+    EXPECT_LT(distance, 1e-4);
+    ASSERT_TRUE(across.getShortestDistanceToPoint(p, distance));
+    EXPECT_LT(distance, 1e-4);
+  }
+  expectSamePoints(hits, crossings(across, spiral), 1e-9);
+  const svy_vector<C2dPos> mirrored = crossings(spiral, mirror);
+  ASSERT_FALSE(mirrored.empty());
+  for (const C2dPos& p : mirrored) {
+    EXPECT_LT(std::fabs(p.east()), 1e-4);
+    EXPECT_LT(p.north(), 5.0);  // within the first approximating arc
+  }
+}
+
+TEST(SegmentIntersection, UndefinedPiecesGiveNothing) {
+  const CCurveSpiral undefinedSpiral;
+  const CCurveArc undefinedArc;
+  const svy_math::TLine undefinedLine;
+  const CGenericLineImpl line(C2dPos(-100.0, -100.0), C2dPos(100.0, 100.0));
+  svy_vector<CCurveArc> cache;
+  EXPECT_FALSE(undefinedSpiral.createCache(cache));
+  EXPECT_TRUE(crossings(line, undefinedSpiral).empty());
+  EXPECT_TRUE(crossings(undefinedArc, line).empty());
+  EXPECT_TRUE(crossings(undefinedLine, line).empty());
+  EXPECT_TRUE(crossings(undefinedSpiral, undefinedArc).empty());
+}
+
+// The visitors see each segment as its own kind.
+class KindCounter : public CGenericSegmentVisitor_const {
+ public:
+  void Visit(const CGenericLine&) override { ++lines; }
+  void Visit(const CGenericArc&) override { ++arcs; }
+  void Visit(const CGenericSpiral&) override { ++spirals; }
+  int lines = 0;
+  int arcs = 0;
+  int spirals = 0;
+};
+
+class Retyper : public CGenericSegmentVisitor {
+ public:
+  void Visit(CGenericLine& line) override { line.setIntersectionType(eIntersectUnbounded); }
+  void Visit(CGenericArc& arc) override { arc.setIntersectionType(eIntersectOnSegment); }
+  void Visit(CGenericSpiral& spiral) override { spiral.setIntersectionType(eIntersectOnSegmentTol); }
+};
+
+TEST(SegmentVisitor, AcceptDispatchesOnTheKind) {
+  CCurveSegment segment = makeSegment(0.0, 0.0, 0.0, 10.0);
+  CCurveArc arc = makeArc(0.0, 0.0, 0.0, 10.0, 20.0, true);
+  CCurveSpiral spiral = makeSpiral(0.0, 0.0, 0.0, 10.0, 20.0, true, true);
+  svy_math::TLine tline(C2dPos(0.0, 0.0), C2dPos(1.0, 0.0));
+  CGenericSegment* all[] = {&segment, &arc, &spiral, &tline};
+  KindCounter counter;
+  Retyper retyper;
+  for (CGenericSegment* s : all) {
+    s->Accept(counter);
+    s->Accept(retyper);
+  }
+  EXPECT_EQ(counter.lines, 2);
+  EXPECT_EQ(counter.arcs, 1);
+  EXPECT_EQ(counter.spirals, 1);
+  EXPECT_EQ(tline.getIntersectionType(), eIntersectUnbounded);
+  EXPECT_EQ(arc.getIntersectionType(), eIntersectOnSegment);
+}
+
+}  // namespace
