@@ -1,13 +1,13 @@
 #include "svyutils/svy_number_text.h"
 
+#include <locale.h>
+
 #include <algorithm>
 #include <charconv>
 #include <clocale>
 #include <cmath>
 #include <string>
 #include <system_error>
-
-#include <locale.h>
 
 #include "svyutils/decimal_digits.h"
 
@@ -70,20 +70,15 @@ locale_t cLocaleHandle() {
 }
 
 std::string fixedText(const svy::math::detail::TDecimal& number, int decimals) {
-  const std::string& digits = number.digits;
-  const auto digitAt = [&](long long index) {
-    return index >= 0 && index < static_cast<long long>(digits.size()) ? digits[static_cast<std::size_t>(index)]
-                                                                       : '0';
-  };
-  std::string text = number.negative && !digits.empty() ? "-" : "";
+  std::string text = number.negative && number.count > 0 ? "-" : "";
   if (number.pointPos <= 0) {
     text += '0';
   } else {
-    for (long long i = 0; i < number.pointPos; ++i) text += digitAt(i);
+    for (long long i = 0; i < number.pointPos; ++i) text += number.digitAt(i);
   }
   if (decimals > 0) {
     text += '.';
-    for (long long i = 0; i < decimals; ++i) text += digitAt(number.pointPos + i);
+    for (long long i = 0; i < decimals; ++i) text += number.digitAt(number.pointPos + i);
   }
   return text;
 }

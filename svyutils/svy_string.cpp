@@ -13,6 +13,8 @@ namespace {
 using String = CSvyStringT<wchar_t>;
 
 constexpr const wchar_t* kBlanks = L" \t\n\r\v\f";
+// Formatted text that fits this many characters (with the terminating zero) needs no heap buffer.
+constexpr std::size_t kStackFormatLength = 128;
 // Formatted text longer than this is not produced (Format leaves the string empty instead).
 constexpr std::size_t kMaxFormattedLength = std::size_t{1} << 24;
 
@@ -117,20 +119,28 @@ void String::Format(const wchar_t* format, ...) {
 void String::FormatV(const wchar_t* format, va_list args) {
   text_.clear();
   if (format == nullptr) return;
-  const std::wstring portable = widenStringConversions(format);
+  // Only a format that mentions 's' or 'c' can hold a text conversion to rewrite.
+  const std::wstring portable =
+      std::wcspbrk(format, L"sc") != nullptr ? widenStringConversions(format) : format;
   const svy_formats::CScopedCLocale cLocale;
-  // Wide printf cannot report the length it needs, so the buffer grows until the text fits.
-  std::wstring buffer(256, L'\0');
-  while (buffer.size() <= kMaxFormattedLength) {
+  // Wide printf cannot report the length it needs: short texts (stations, numbers) fit the stack buffer,
+  // longer ones get a heap buffer that grows until the text fits.
+  wchar_t stackBuffer[kStackFormatLength];
+  std::wstring heapBuffer;
+  wchar_t* buffer = stackBuffer;
+  std::size_t size = kStackFormatLength;
+  while (size <= kMaxFormattedLength) {
     va_list attempt;
     va_copy(attempt, args);
-    const int written = std::vswprintf(&buffer[0], buffer.size(), portable.c_str(), attempt);
+    const int written = std::vswprintf(buffer, size, portable.c_str(), attempt);
     va_end(attempt);
     if (written >= 0) {
-      text_.assign(buffer.data(), static_cast<std::size_t>(written));
+      text_.assign(buffer, static_cast<std::size_t>(written));
       return;
     }
-    buffer.assign(buffer.size() * 4, L'\0');
+    size *= 4;
+    heapBuffer.assign(size, L'\0');
+    buffer = &heapBuffer[0];
   }
 }
 
@@ -231,7 +241,8 @@ int String::Replace(const wchar_t* oldText, const wchar_t* newText) {
   const std::wstring from(oldText);
   const std::wstring to(newText != nullptr ? newText : L"");
   int count = 0;
-  for (std::size_t pos = text_.find(from); pos != std::wstring::npos; pos = text_.find(from, pos + to.size())) {
+  for (std::size_t pos = text_.find(from); pos != std::wstring::npos;
+       pos = text_.find(from, pos + to.size())) {
     text_.replace(pos, from.size(), to);
     ++count;
   }

@@ -28,7 +28,7 @@ class SVYUTILS_API CSvyStringT<wchar_t> {
   CSvyStringT(const wchar_t* text);  // NOLINT(google-explicit-constructor): used like a string literal
   CSvyStringT(const wchar_t* text, int length);
   CSvyStringT(const char* text, unsigned codePage = kCodePageUtf8);  // NOLINT(google-explicit-constructor)
-  CSvyStringT(const std::wstring& text);  // NOLINT(google-explicit-constructor)
+  CSvyStringT(const std::wstring& text);                             // NOLINT(google-explicit-constructor)
   CSvyStringT(wchar_t ch, int repeat);
 
   CSvyStringT& operator=(const wchar_t* text);

@@ -1,6 +1,6 @@
-#include <gtest/gtest.h>
-
 #include "svymath/formats/dms_text.h"
+
+#include <gtest/gtest.h>
 
 namespace {
 
@@ -35,10 +35,10 @@ INSTANTIATE_TEST_SUITE_P(
 INSTANTIATE_TEST_SUITE_P(
     Fields, CheckValidDmsTable,
     ::testing::Values(TDmsCase{L"45.3015", L"360", false, true}, TDmsCase{L"45.6000", L"360", false, false},
-                      TDmsCase{L"45.5", L"360", false, true},    // one digit of minutes is its tens: 50
-                      TDmsCase{L"45.6", L"360", false, false},   // 60 minutes
+                      TDmsCase{L"45.5", L"360", false, true},   // one digit of minutes is its tens: 50
+                      TDmsCase{L"45.6", L"360", false, false},  // 60 minutes
                       TDmsCase{L"45.3060", L"360", false, false}, TDmsCase{L"45.306", L"360", false, false},
-                      TDmsCase{L"45.305", L"360", false, true},  TDmsCase{L"45.5959", L"360", false, true},
+                      TDmsCase{L"45.305", L"360", false, true}, TDmsCase{L"45.5959", L"360", false, true},
                       TDmsCase{L"45.30159999", L"360", false, true},  // digits after the seconds unchecked
                       TDmsCase{L"45.", L"360", false, true}, TDmsCase{L"45", L"360", false, true},
                       TDmsCase{L".3000", L"360", false, true}));

@@ -1,10 +1,10 @@
+#include "svymath/formats/round_double.h"
+
 #include <gtest/gtest.h>
 
 #include <climits>
 #include <cmath>
 #include <limits>
-
-#include "svymath/formats/round_double.h"
 
 namespace {
 
@@ -17,7 +17,7 @@ TEST(RoundDouble, AddsHalfAUnitWithTheSignOfX) {
     double expected;
   } const cases[] = {
       {0.0, 2, -0.005},  // zero takes the negative branch
-      {1.234, 2, 1.239},  {-1.234, 2, -1.239}, {2.5, 0, 3.0},   {-2.5, 0, -3.0},
+      {1.234, 2, 1.239},    {-1.234, 2, -1.239},    {2.5, 0, 3.0},   {-2.5, 0, -3.0},
       {1234.0, -2, 1284.0}, {-1234.0, -2, -1284.0}, {7.0, -1, 12.0},
   };
   for (const auto& c : cases) {
@@ -51,7 +51,8 @@ TEST(RoundDouble, ExtremeDigitsAndNonFiniteValues) {
   EXPECT_EQ(RoundDouble(3.0, INT_MAX), 3.0);  // the half unit underflows to zero
   EXPECT_TRUE(std::isinf(RoundDouble(3.0, INT_MIN)));
   EXPECT_TRUE(std::isnan(RoundDouble(std::numeric_limits<double>::quiet_NaN(), 2)));
-  EXPECT_EQ(RoundDouble(-std::numeric_limits<double>::infinity(), 2), -std::numeric_limits<double>::infinity());
+  EXPECT_EQ(RoundDouble(-std::numeric_limits<double>::infinity(), 2),
+            -std::numeric_limits<double>::infinity());
 }
 
 }  // namespace

@@ -1,3 +1,5 @@
+#include "svymath/formats/station_text.h"
+
 #include <gtest/gtest.h>
 
 #include <climits>
@@ -5,8 +7,6 @@
 #include <cmath>
 #include <limits>
 #include <string>
-
-#include "svymath/formats/station_text.h"
 
 namespace {
 
@@ -86,8 +86,8 @@ INSTANTIATE_TEST_SUITE_P(
 // the centimetre that the text carries.
 TEST(StationTextRoundTrip, WrittenTextReadsBackToTheStation) {
   const double intervals[] = {1000.0, 100.0, 20.0, 1.0};
-  const double stations[] = {0.0,     0.004,    0.005,   1.0,     99.994,    99.996,     999.999,
-                             1000.0,  1234.567, 5005.3,  20000.0, 123456.78, 987654.321, 2.5e6};
+  const double stations[] = {0.0,    0.004,    0.005,  1.0,     99.994,    99.996,     999.999,
+                             1000.0, 1234.567, 5005.3, 20000.0, 123456.78, 987654.321, 2.5e6};
   for (double interval : intervals) {
     for (double magnitude : stations) {
       for (double station : {magnitude, -magnitude}) {

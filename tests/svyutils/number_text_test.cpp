@@ -1,7 +1,7 @@
 #include <gtest/gtest.h>
+#include <locale.h>
 
 #include <clocale>
-#include <locale.h>
 #include <cmath>
 #include <cstdint>
 #include <limits>
@@ -39,8 +39,8 @@ TEST_P(StringToIntTable, ParsesWholeTextOrLeavesOutputAlone) {
 INSTANTIATE_TEST_SUITE_P(
     Cases, StringToIntTable,
     ::testing::Values(TIntCase{L"0", true, 0}, TIntCase{L"42", true, 42}, TIntCase{L"+42", true, 42},
-                      TIntCase{L"-42", true, -42}, TIntCase{L" \t17 \n", true, 17},
-                      TIntCase{L"007", true, 7}, TIntCase{L"2147483647", true, 2147483647},
+                      TIntCase{L"-42", true, -42}, TIntCase{L" \t17 \n", true, 17}, TIntCase{L"007", true, 7},
+                      TIntCase{L"2147483647", true, 2147483647},
                       TIntCase{L"-2147483648", true, -2147483647 - 1}, TIntCase{L"2147483648", false, 0},
                       TIntCase{L"-2147483649", false, 0}, TIntCase{L"99999999999999999999", false, 0},
                       TIntCase{L"", false, 0}, TIntCase{L"   ", false, 0}, TIntCase{L"+", false, 0},

@@ -1,3 +1,5 @@
+#include "svyutils/round_prec.h"
+
 #include <gtest/gtest.h>
 
 #include <climits>
@@ -5,8 +7,6 @@
 #include <cstdint>
 #include <limits>
 #include <random>
-
-#include "svyutils/round_prec.h"
 
 namespace {
 
@@ -46,7 +46,8 @@ INSTANTIATE_TEST_SUITE_P(
 TEST(RoundPrec, SpecialValuesPassThrough) {
   EXPECT_TRUE(std::isnan(round_prec(std::numeric_limits<double>::quiet_NaN(), 2)));
   EXPECT_EQ(round_prec(std::numeric_limits<double>::infinity(), 2), std::numeric_limits<double>::infinity());
-  EXPECT_EQ(round_prec(-std::numeric_limits<double>::infinity(), -3), -std::numeric_limits<double>::infinity());
+  EXPECT_EQ(round_prec(-std::numeric_limits<double>::infinity(), -3),
+            -std::numeric_limits<double>::infinity());
   EXPECT_TRUE(std::signbit(round_prec(-0.0, 2)));
   EXPECT_TRUE(std::signbit(round_prec(-0.001, 2)));  // the sign of a value rounded to zero is kept
 }

@@ -24,24 +24,30 @@ TEST_P(SvyStringUtf8, DecodesAndEncodesBack) {
   EXPECT_EQ(text.ToNarrow(kCodePageUtf8), std::string(c.utf8));
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    WellFormed, SvyStringUtf8,
-    ::testing::Values(TUtf8Case{"", L""}, TUtf8Case{"N 12.5", L"N 12.5"},
-                      TUtf8Case{"45\xC2\xB0" "30'", L"45\u00B030'"},          // degree sign, 2 bytes
-                      TUtf8Case{"\xE2\x82\xAC 5", L"\u20AC 5"},               // euro sign, 3 bytes
-                      TUtf8Case{"\xF0\x9D\x84\x9E", std::wstring(L"\U0001D11E")}));  // 4 bytes
+INSTANTIATE_TEST_SUITE_P(WellFormed, SvyStringUtf8,
+                         ::testing::Values(TUtf8Case{"", L""}, TUtf8Case{"N 12.5", L"N 12.5"},
+                                           TUtf8Case{"45\xC2\xB0"
+                                                     "30'",
+                                                     L"45\u00B030'"},                 // degree sign, 2 bytes
+                                           TUtf8Case{"\xE2\x82\xAC 5", L"\u20AC 5"},  // euro sign, 3 bytes
+                                           TUtf8Case{"\xF0\x9D\x84\x9E",
+                                                     std::wstring(L"\U0001D11E")}));  // 4 bytes
 
 TEST(SvyStringUtf8Malformed, BecomesReplacementCharacterAndContinues) {
   struct {
     const char* bytes;
     std::wstring expected;
   } const cases[] = {
-      {"a\x80" "b", L"a\uFFFDb"},             // stray continuation byte
-      {"a\xC3", L"a\uFFFD"},                  // truncated at the end of the text
-      {"\xC0\xAF", L"\uFFFD\uFFFD"},          // overlong '/'
-      {"\xED\xA0\x80", L"\uFFFD\uFFFD\uFFFD"},  // encoded surrogate
+      {"a\x80"
+       "b",
+       L"a\uFFFDb"},                                      // stray continuation byte
+      {"a\xC3", L"a\uFFFD"},                              // truncated at the end of the text
+      {"\xC0\xAF", L"\uFFFD\uFFFD"},                      // overlong '/'
+      {"\xED\xA0\x80", L"\uFFFD\uFFFD\uFFFD"},            // encoded surrogate
       {"\xF4\x90\x80\x80", L"\uFFFD\uFFFD\uFFFD\uFFFD"},  // beyond U+10FFFF
-      {"\xFF" "x", L"\uFFFDx"},
+      {"\xFF"
+       "x",
+       L"\uFFFDx"},
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(c.bytes);
@@ -81,10 +87,10 @@ TEST(SvyStringSubstrings, ClampToTheText) {
     CSvyString actual;
     const wchar_t* expected;
   } const cases[] = {
-      {text.Mid(2), L"cdef"},     {text.Mid(2, 2), L"cd"},     {text.Mid(-3, 2), L"ab"},
-      {text.Mid(4, 99), L"ef"},   {text.Mid(9), L""},          {text.Mid(1, -1), L""},
-      {text.Left(2), L"ab"},      {text.Left(-1), L""},        {text.Left(99), L"abcdef"},
-      {text.Right(2), L"ef"},     {text.Right(-1), L""},       {text.Right(99), L"abcdef"},
+      {text.Mid(2), L"cdef"},   {text.Mid(2, 2), L"cd"}, {text.Mid(-3, 2), L"ab"},
+      {text.Mid(4, 99), L"ef"}, {text.Mid(9), L""},      {text.Mid(1, -1), L""},
+      {text.Left(2), L"ab"},    {text.Left(-1), L""},    {text.Left(99), L"abcdef"},
+      {text.Right(2), L"ef"},   {text.Right(-1), L""},   {text.Right(99), L"abcdef"},
   };
   for (const auto& c : cases) EXPECT_EQ(c.actual.str(), c.expected);
 }
@@ -135,11 +141,16 @@ TEST(SvyStringCompare, OrdinalAndCaseFolded) {
     int ordinal;
     int noCase;
   } const cases[] = {
-      {L"abc", L"abc", 0, 0},   {L"abc", L"ABC", 1, 0},      {L"abc", L"abd", -1, -1},
-      {L"ab", L"abc", -1, -1},  {L"abc", L"AB", 1, 1},       {L"", L"", 0, 0},
-      {L"\u00C9t\u00C9", L"\u00E9T\u00E9", -1, 0},        // Latin-1 letters fold too
-      {L"\u00D7", L"\u00F7", -1, -1},                      // the signs are no letters
-      {L"360", L"360", 0, 0},   {L" 45", L"360", -1, -1},
+      {L"abc", L"abc", 0, 0},
+      {L"abc", L"ABC", 1, 0},
+      {L"abc", L"abd", -1, -1},
+      {L"ab", L"abc", -1, -1},
+      {L"abc", L"AB", 1, 1},
+      {L"", L"", 0, 0},
+      {L"\u00C9t\u00C9", L"\u00E9T\u00E9", -1, 0},  // Latin-1 letters fold too
+      {L"\u00D7", L"\u00F7", -1, -1},               // the signs are no letters
+      {L"360", L"360", 0, 0},
+      {L" 45", L"360", -1, -1},
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << "case " << (&c - cases));
