@@ -220,8 +220,8 @@ TEST(ArcElement, ShortestDistanceIsSignedAndIgnoresTheSweep) {
 
 TEST(ArcElement, ProjectionMatchesDenseSamplingInsideAndOutsideTheSweep) {
   const CCurveArc arc = makeArc(10.0, 10.0, 120.0, 200.0, 70.0, false);
-  for (double n = -250.0; n <= 250.0; n += 41.0) {
-    for (double e = -250.0; e <= 250.0; e += 37.0) {
+  for (double n = -250.0; n <= 250.0; n += 83.0) {
+    for (double e = -250.0; e <= 250.0; e += 71.0) {
       double dist = 0.0;
       double len = 0.0;
       ASSERT_TRUE(arc.getShortestDistAndCurveLen(n, e, dist, len));
