@@ -20,6 +20,18 @@ void writeBoth(const C2dPos& p, C2dPos& solution1, C2dPos& solution2) {
   solution2 = p;
 }
 
+// Where two touching circles meet, as a distance from centre1 along the line centre1 -> centre2 (at
+// `distance`): halfway between the two circles' points on that line that come closest. Externally these
+// face each other between the centres; internally they lie on the far side of the smaller circle from
+// the larger one's centre. Unlike the chord formula this stays well conditioned for nearly concentric
+// circles.
+double touchingPointAlongCentres(double distance, double radius1, double radius2, double externalGap,
+                                 double internalGap) {
+  if (std::fabs(externalGap) <= std::fabs(internalGap)) return radius1 + externalGap / 2.0;
+  if (radius1 >= radius2) return (radius1 + distance + radius2) / 2.0;
+  return -(radius1 + radius2 - distance) / 2.0;
+}
+
 }  // namespace
 
 int IntersectionCoordsOfLineAndCircle(const C2dPos& linePos1, const C2dPos& linePos2,
@@ -70,8 +82,11 @@ int IntersectionCoordsOfLineAndCircle(const C2dPos& linePos1, const C2dPos& line
     const double east = alongEasting ? u : v;
     return C2dPos(center.north() + north * radius, center.east() + east * radius);
   };
-  solution1 = toPos(uFirst);
-  solution2 = toPos(uSecond);
+  const C2dPos first = toPos(uFirst);
+  const C2dPos second = toPos(uSecond);
+  if (!isFinitePos(first) || !isFinitePos(second)) return 0;
+  solution1 = first;
+  solution2 = second;
   return count;
 }
 
@@ -91,23 +106,31 @@ int IntersectionCoordsOfTwoCircles(const C2dPos& center1, double radius1, const 
   const double internalGap = radiusDiff - distance;
   if (externalGap > kTangency || internalGap > kTangency) return 0;
 
+  const double uN = dN / distance;
+  const double uE = dE / distance;
+  auto alongCentreLine = [&](double along) {
+    return C2dPos(center1.north() + along * uN, center1.east() + along * uE);
+  };
   // Distance from center1 along the centre line to the chord of the crossings,
   // (d^2 + r1^2 - r2^2) / (2d) written without squaring d.
   const double alongCentres =
       (distance + (radius1 - radius2) * ((radius1 + radius2) / distance)) / 2.0;
-  const double uN = dN / distance;
-  const double uE = dE / distance;
-  const C2dPos chordMiddle(center1.north() + alongCentres * uN, center1.east() + alongCentres * uE);
-  if (!isFinitePos(chordMiddle)) return 0;
   const double halfChordSq = (radius1 - alongCentres) * (radius1 + alongCentres);
-  if (std::fabs(externalGap) <= kTangency || std::fabs(internalGap) <= kTangency ||
-      !(halfChordSq > 0.0)) {
-    writeBoth(chordMiddle, solution1, solution2);
+  const bool touching = std::fabs(externalGap) <= kTangency || std::fabs(internalGap) <= kTangency;
+  if (touching || !(halfChordSq > 0.0)) {
+    const C2dPos touchPoint = alongCentreLine(
+        touchingPointAlongCentres(distance, radius1, radius2, externalGap, internalGap));
+    if (!isFinitePos(touchPoint)) return 0;
+    writeBoth(touchPoint, solution1, solution2);
     return 1;
   }
+  const C2dPos chordMiddle = alongCentreLine(alongCentres);
   // The right-hand normal of the direction (uN, uE) is (-uE, uN).
   const double halfChord = std::sqrt(halfChordSq);
-  solution1 = C2dPos(chordMiddle.north() - halfChord * uE, chordMiddle.east() + halfChord * uN);
-  solution2 = C2dPos(chordMiddle.north() + halfChord * uE, chordMiddle.east() - halfChord * uN);
+  const C2dPos right(chordMiddle.north() - halfChord * uE, chordMiddle.east() + halfChord * uN);
+  const C2dPos left(chordMiddle.north() + halfChord * uE, chordMiddle.east() - halfChord * uN);
+  if (!isFinitePos(right) || !isFinitePos(left)) return 0;
+  solution1 = right;
+  solution2 = left;
   return 2;
 }

@@ -264,6 +264,24 @@ TEST(TwoCircles, DisjointNestedConcentricAndInvalidGiveNoSolution) {
   EXPECT_EQ(s2, C2dPos(-2, -2));
 }
 
+TEST(TwoCircles, NearlyConcentricTouchingCirclesTouchOnTheSmallerOnesFarSide) {
+  // Centres 2e-8 apart, radii differing by 2.5e-8: touching within the tolerance. The point must lie on
+  // both circles (the chord formula would put it 2.5 m off here).
+  const double d = 2e-8;
+  const C2dPos center2(kOrigin.north(), kOrigin.east() + d);
+  for (const bool firstLarger : {true, false}) {
+    SCOPED_TRACE(firstLarger);
+    const double r1 = firstLarger ? 10.0 : 10.0 - 2.5e-8;
+    const double r2 = firstLarger ? 10.0 - 2.5e-8 : 10.0;
+    C2dPos s1, s2;
+    ASSERT_EQ(IntersectionCoordsOfTwoCircles(kOrigin, r1, center2, r2, s1, s2), 1);
+    EXPECT_NEAR(dist(s1, kOrigin), r1, 1e-8);
+    EXPECT_NEAR(dist(s1, center2), r2, 1e-8);
+    EXPECT_NEAR(s1.north(), 0.0, 1e-12);
+    EXPECT_GT(s1.east() * (firstLarger ? 1.0 : -1.0), 0.0);
+  }
+}
+
 TEST(TwoCircles, EqualCirclesALittleApartCrossFarFromTheCentreLine) {
   // Nearly concentric but distinct: the crossings are almost a diameter apart, across the centre line.
   C2dPos s1, s2;
