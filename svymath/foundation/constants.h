@@ -29,6 +29,11 @@ constexpr double kPolarAxisDistance = 1e-10;
 // earth near the equatorial plane (where the map's slope approaches 1) need up to a few million. Reaching
 // the cap ends with NaN instead of looping.
 constexpr int kGeodeticIterationCap = 100000000;
+// Geodesic inverse (azimuth between two geodetic positions): the longitude on the auxiliary sphere is
+// iterated until it changes by less than this (radians, 0.006 mm on the earth), at most kGeodesicIterationCap
+// times; nearly antipodal pairs, where the iteration fails, take the auxiliary great-circle azimuth.
+constexpr double kGeodesicLongitude = 1e-12;
+constexpr int kGeodesicIterationCap = 200;
 
 }  // namespace tol
 
