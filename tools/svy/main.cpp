@@ -18,7 +18,6 @@ int main(int argc, char** argv) {
   registerAngleVerbs(app);
   registerStationVerbs(app);
   registerUnitsVerbs(app);
-  registerFitVerbs(app);
   registerCurveVerbs(app);
 
   try {
