@@ -18,6 +18,7 @@ int main(int argc, char** argv) {
   registerAngleVerbs(app);
   registerStationVerbs(app);
   registerUnitsVerbs(app);
+  registerFitVerbs(app);
   registerCurveVerbs(app);
 
   try {

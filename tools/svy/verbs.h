@@ -12,3 +12,5 @@ void registerStationVerbs(CLI::App& app);
 void registerUnitsVerbs(CLI::App& app);
 // "svy curve" (circular-curve quantities) and "svy spiral" (transition-spiral tables).
 void registerCurveVerbs(CLI::App& app);
+// "svy fit": least-squares best-fit line, circle and radius of plane points.
+void registerFitVerbs(CLI::App& app);
