@@ -56,3 +56,6 @@
 #include "svymath/geodesy/geo_coord.h"
 #include "svymath/geodesy/local_frame.h"
 #include "svymath/geodesy/gps_time.h"
+#include "svymath/formats/number_predicates.h"
+#include "svymath/formats/sign_strings.h"
+#include "svymath/formats/bearing_text.h"

@@ -1,0 +1,74 @@
+#include "svymath/formats/bearing_text.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <cwchar>
+#include <limits>
+#include <random>
+#include <string>
+
+namespace {
+
+using svy_formats::DegreeToBearing;
+
+struct TBearingCase {
+  double azimuth;
+  int decimals;
+  const wchar_t* text;
+};
+
+class DegreeToBearingTable : public ::testing::TestWithParam<TBearingCase> {};
+
+TEST_P(DegreeToBearingTable, QuadrantLettersAndPaddedFields) {
+  const TBearingCase& c = GetParam();
+  EXPECT_EQ(DegreeToBearing(c.azimuth, c.decimals).str(), c.text);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, DegreeToBearingTable,
+    ::testing::Values(
+        TBearingCase{45.0 + 30.0 / 60 + 15.0 / 3600, 0, L"N 45\u00B030'15\" E"},
+        TBearingCase{0.0, 0, L"N 0\u00B000'00\" E"}, TBearingCase{90.0, 1, L"N 90\u00B000'00.0\" E"},
+        TBearingCase{135.5, 0, L"S 44\u00B030'00\" E"}, TBearingCase{180.0, 0, L"S 0\u00B000'00\" E"},
+        TBearingCase{192.0 + 5.0 / 60, 0, L"S 12\u00B005'00\" W"},
+        TBearingCase{270.0, 0, L"N 90\u00B000'00\" W"}, TBearingCase{-45.0, 0, L"N 45\u00B000'00\" W"},
+        TBearingCase{405.0, 0, L"N 45\u00B000'00\" E"},
+        TBearingCase{10.0 + 59.0 / 60 + 59.96 / 3600, 1, L"N 11\u00B000'00.0\" E"},  // carry
+        TBearingCase{1.0 / 3600 * 5.25, 2, L"N 0\u00B000'05.25\" E"},
+        TBearingCase{30.0, -2, L"N 30\u00B000'00\" E"}));
+
+TEST(DegreeToBearing, NonFiniteAzimuthGivesEmptyText) {
+  EXPECT_TRUE(DegreeToBearing(std::numeric_limits<double>::quiet_NaN(), 0).IsEmpty());
+  EXPECT_TRUE(DegreeToBearing(std::numeric_limits<double>::infinity(), 0).IsEmpty());
+}
+
+// The bearing read back (letters, degrees, minutes, seconds) gives the azimuth within half a unit of the
+// last written decimal of the seconds.
+TEST(DegreeToBearing, ReadsBackToTheAzimuth) {
+  std::mt19937_64 random(5);
+  std::uniform_real_distribution<double> azimuth(0.0, 360.0);
+  for (int i = 0; i < 3000; ++i) {
+    const double az = azimuth(random);
+    const int decimals = i % 4;
+    const std::wstring text = DegreeToBearing(az, decimals).str();
+    wchar_t from = 0;
+    wchar_t toward = 0;
+    int d = 0;
+    int m = 0;
+    double s = 0.0;
+    ASSERT_EQ(std::swscanf(text.c_str(), L"%lc %d\u00B0%d'%lf\" %lc", &from, &d, &m, &s, &toward), 5) << az;
+    ASSERT_LT(m, 60);
+    ASSERT_LT(s, 60.0);
+    const double angle = d + m / 60.0 + s / 3600.0;
+    double back = angle;
+    if (from == L'S' && toward == L'E') back = 180.0 - angle;
+    if (from == L'S' && toward == L'W') back = 180.0 + angle;
+    if (from == L'N' && toward == L'W') back = 360.0 - angle;
+    double diff = std::fabs(back - az);
+    diff = std::fmin(diff, 360.0 - diff);
+    EXPECT_LE(diff, 0.5 * std::pow(10.0, -decimals) / 3600.0 + 1e-12) << az << " " << decimals;
+  }
+}
+
+}  // namespace
