@@ -59,3 +59,4 @@
 #include "svymath/formats/number_predicates.h"
 #include "svymath/formats/sign_strings.h"
 #include "svymath/formats/bearing_text.h"
+#include "svymath/formats/angle_text.h"

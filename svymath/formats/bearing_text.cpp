@@ -3,8 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "svymath/formats/angle_text.h"
 #include "svymath/foundation/angle_functions.h"
-#include "svyutils/svy_number_text.h"
 
 namespace svy_formats {
 namespace {
@@ -36,15 +36,11 @@ svy_text::CSvyString DegreeToBearing(double azimuthDeg, int secondDecimals) {
   if (!std::isfinite(azimuthDeg)) return svy_text::CSvyString();
   const int decimals = std::clamp(secondDecimals, 0, kMaxSecondDecimals);
   const TQuadrantBearing bearing = quadrantBearing(pos360(azimuthDeg));
-  bool negative = false;
-  int degrees = 0;
-  int minutes = 0;
-  double seconds = 0.0;
-  Deg2DDDMMSS(bearing.angle, negative, degrees, minutes, seconds, decimals);
-  const svy_text::CSvyString secondsText = DoubleToString(seconds, decimals);
-  svy_text::CSvyString text;
-  text.Format(L"%ls %d\u00B0%02d'%ls%ls\" %ls", bearing.from, degrees, minutes, seconds < 10.0 ? L"0" : L"",
-              secondsText.c_str(), bearing.toward);
+  svy_text::CSvyString text(bearing.from);
+  text += L' ';
+  text += DMSToString(bearing.angle, decimals);
+  text += L' ';
+  text += bearing.toward;
   return text;
 }
 
