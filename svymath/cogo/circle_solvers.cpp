@@ -72,7 +72,7 @@ int IntersectionCoordsOfLineAndCircle(const C2dPos& linePos1, const C2dPos& line
   } else {
     count = SolutionTo2ndDegreePolynomial(a, b, c, uFirst, uSecond);
     if (count == 0) return 0;
-    // The larger root comes first; travelling toward decreasing u meets it first.
+    // The roots come larger first (a > 0), which is the order of travel only toward decreasing u.
     if (du > 0.0) std::swap(uFirst, uSecond);
   }
 
