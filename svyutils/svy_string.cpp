@@ -1,6 +1,7 @@
 #include "svyutils/svy_string.h"
 
 #include <algorithm>
+#include <cerrno>
 #include <cstddef>
 #include <cwchar>
 
@@ -52,7 +53,7 @@ std::wstring widenStringConversions(const wchar_t* format) {
       out += *p;
       continue;
     }
-    while (*p != L'\0' && std::wcschr(L"-+ #0'.*123456789", *p) != nullptr) out += *p++;
+    while (*p != L'\0' && std::wcschr(L"-+ #0'.*$123456789", *p) != nullptr) out += *p++;
     std::wstring length;
     while (*p != L'\0' && std::wcschr(L"hlLqjzt", *p) != nullptr) length += *p++;
     if (*p == L'\0') {
@@ -132,12 +133,15 @@ void String::FormatV(const wchar_t* format, va_list args) {
   while (size <= kMaxFormattedLength) {
     va_list attempt;
     va_copy(attempt, args);
+    errno = 0;
     const int written = std::vswprintf(buffer, size, portable.c_str(), attempt);
     va_end(attempt);
     if (written >= 0) {
       text_.assign(buffer, static_cast<std::size_t>(written));
       return;
     }
+    // Narrow text that is not ASCII cannot be converted in the C locale: no buffer size would help.
+    if (errno == EILSEQ) return;
     size *= 4;
     heapBuffer.assign(size, L'\0');
     buffer = &heapBuffer[0];

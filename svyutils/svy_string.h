@@ -38,7 +38,9 @@ class SVYUTILS_API CSvyStringT<wchar_t> {
   CSvyStringT& operator+=(wchar_t ch);
 
   // printf-style formatting of wide text, always in the C locale (decimal point '.', no grouping).
-  // Wide strings are passed with %ls (or %s: both read wchar_t text here), narrow ones with %hs.
+  // Wide strings are passed with %ls (or %s: both read wchar_t text here), narrow ones with %hs (ASCII
+  // only: other narrow text cannot be converted in the C locale, and the result is then empty). Pass
+  // c_str() for a CSvyString argument.
   void Format(const wchar_t* format, ...);
   void FormatV(const wchar_t* format, va_list args);
   void AppendFormat(const wchar_t* format, ...);

@@ -196,6 +196,15 @@ TEST(SvyStringFormat, PrintfConversionsWithWideStrings) {
   EXPECT_EQ(appended.str(), L"N=12.000");
 }
 
+TEST(SvyStringFormat, PositionalArgumentsAndUnconvertibleNarrowText) {
+  CSvyString text;
+  text.Format(L"%2$s=%1$d", 7, L"k");
+  EXPECT_EQ(text.str(), L"k=7");
+  // A narrow byte beyond ASCII has no meaning in the C locale: the text is empty, quickly.
+  text.Format(L"%hs", "\xC3\xA9");
+  EXPECT_TRUE(text.IsEmpty());
+}
+
 TEST(SvyStringFormat, GrowsForLongOutput) {
   const std::wstring longText(5000, L'z');
   CSvyString text;
