@@ -5,7 +5,8 @@
 // the same sign. Lengths are never negative.
 //
 // The record keeps the length and the radius as defined and derives the other from the centre angle when
-// only one is known. Undefined values are NaN.
+// only one is known. Undefined values are NaN. The derived values are cached inside const queries, so one
+// record must not be read from two threads at once.
 #include <cstdint>
 
 #include "svymath/curves/curve_display.h"

@@ -4,7 +4,8 @@
 // from the origin along its own azimuth relative to that frame, for its length.
 //
 // Defined either by setLen with one of the setAz forms, or by setFinalNE (the local end point, from which
-// length and azimuth follow). Undefined values are NaN.
+// length and azimuth follow). Undefined values are NaN. The sine and cosine of the azimuth are cached inside
+// const queries, so one record must not be read from two threads at once.
 #include <cstdint>
 
 #include "svymath/foundation/class_new.h"

@@ -75,25 +75,37 @@ bool CGenericArc::checkValidAzimuthToIntersectionPoint(const CMathAngle& start, 
                         : isAngleRadInRange(end, start, test, tolerance);
 }
 
+bool CGenericArc::getSweepFrame(C2dPos& centre, CMathAngle& toStart, CMathAngle& toEnd) const {
+  if (!getArcCenterPos(centre) || !toStart.setAz(centre, getStartPos()) || !toEnd.setAz(centre, getEndPos())) {
+    return false;
+  }
+  return true;
+}
+
 bool CGenericArc::checkValidIntersectionPoint(const C2dPos& pos) const {
-  return checkValidAzimuthToIntersectionPoint(getAzimuthCenterToStart(), getAzimuthCenterToEnd(),
-                                              getAzimuthFromCenter(pos));
+  C2dPos centre;
+  CMathAngle toStart;
+  CMathAngle toEnd;
+  CMathAngle toPos;
+  return getSweepFrame(centre, toStart, toEnd) && toPos.setAz(centre, pos) &&
+         checkValidAzimuthToIntersectionPoint(toStart, toEnd, toPos);
 }
 
 bool CGenericArc::getLengthAndOffset(double north, double east, double& length, double& offset) const {
   C2dPos centre;
-  if (!getArcCenterPos(centre)) return false;
+  CMathAngle toStart;
+  CMathAngle toEnd;
+  if (!getSweepFrame(centre, toStart, toEnd)) return false;
   const double radius = getRadius();
   if (within(north, centre.north(), svy_math::tol::kSnap) && within(east, centre.east(), svy_math::tol::kSnap)) {
     length = 0.0;
     offset = radius;
     return true;
   }
-  const C2dPos pos(north, east);
-  const CMathAngle toStart = getAzimuthCenterToStart();
-  const CMathAngle toEnd = getAzimuthCenterToEnd();
-  const CMathAngle toPos = getAzimuthFromCenter(pos);
-  if (!checkValidAzimuthToIntersectionPoint(toStart, toEnd, toPos)) return false;
+  CMathAngle toPos;
+  if (!toPos.setAz(centre, C2dPos(north, east)) || !checkValidAzimuthToIntersectionPoint(toStart, toEnd, toPos)) {
+    return false;
+  }
   const double distance = std::hypot(north - centre.north(), east - centre.east());
   double sweep = 0.0;
   if (isToTheRight()) {
@@ -121,15 +133,15 @@ bool CGenericArc::getShortestDistanceToPoint(double north, double east, double& 
 C2dMinMax CGenericArc::getBoundary() const {
   C2dMinMax box(getStartPos(), getEndPos());
   C2dPos centre;
-  if (!getArcCenterPos(centre)) return box;
+  CMathAngle toStart;
+  CMathAngle toEnd;
+  if (!getSweepFrame(centre, toStart, toEnd)) return box;
   const double radius = std::fabs(getRadius());
   // The four points where the circle reaches its extreme northing or easting: north, east, south, west.
   const C2dPos extremes[] = {C2dPos(centre.north() + radius, centre.east()),
                              C2dPos(centre.north(), centre.east() + radius),
                              C2dPos(centre.north() - radius, centre.east()),
                              C2dPos(centre.north(), centre.east() - radius)};
-  const CMathAngle toStart = getAzimuthCenterToStart();
-  const CMathAngle toEnd = getAzimuthCenterToEnd();
   const bool full = isFullCircle();
   for (int quarter = 0; quarter < 4; ++quarter) {
     CMathAngle direction;

@@ -70,6 +70,8 @@ class SVYMATH_API CGenericArc : public CGenericSegment {
   bool doCalcIntersections(const CGenericLine& other, svy_vector<C2dPos>& out) const override;
 
  private:
+  // The centre and the directions from it to the start and the end; false when undefined.
+  bool getSweepFrame(C2dPos& centre, CMathAngle& toStart, CMathAngle& toEnd) const;
   // Appends the crossings of the circle with the line through the two positions that pass the sweep test.
   bool appendLineCrossings(const C2dPos& linePos1, const C2dPos& linePos2, svy_vector<C2dPos>& out) const;
 };

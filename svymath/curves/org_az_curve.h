@@ -65,6 +65,9 @@ class COrgAzCurveT : public Base {
     return svy_math::detail::intersectRays(this->getStartPos(), startAz, this->getEndPos(), endAz, ip);
   }
 
+  // Heap copy owned by the caller.
+  virtual CGenericSegment* clone() const = 0;
+
   // The point of the element nearest to (north, east): len its length along the element, dist its distance,
   // positive when the point lies right of the direction of travel there. False when undefined.
   virtual bool getShortestDistAndCurveLen(double north, double east, double& dist, double& len) const {
@@ -73,9 +76,6 @@ class COrgAzCurveT : public Base {
     return toLocal(north, east, localNorth, localEast) &&
            m_data.getShortestDistAndCurveLen(localNorth, localEast, dist, len);
   }
-
-  // Heap copy owned by the caller.
-  virtual CGenericSegment* clone() const = 0;
 
   // ---- the segment interface ----
   bool isok() const override { return isOrgAzOk() && m_data.isok(); }
