@@ -3,8 +3,11 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <string>
 
+#include "support/refdata.h"
 #include "test_curve_primitives_support.h"
+#include "test_spiral_support.h"
 
 namespace {
 
@@ -188,6 +191,48 @@ TEST(SpiralElement, CurveIpOfFullSpiralAtLongTangent) {
   const double theta = 100.0 / 600.0;
   EXPECT_NEAR(ip.east(), 0.0, 1e-12);
   EXPECT_NEAR(ip.north(), end.north() - end.east() / std::tan(theta), 1e-9);
+}
+
+
+// Published clothoid tables (start at the origin heading +X, radius positive to the LEFT, X east, Y north),
+// full and partial, into and out of the curve: N = Y, E = X, start azimuth 90 degrees, side negated. Each
+// row's position must come back within the table's own accuracy, and its length and offset by the search.
+TEST(SpiralElement, MatchesPublishedClothoidTables) {
+  SVY_SKIP_WITHOUT_REFDATA();
+  const std::string folder = "alignment/ifc-alignment-geometry-implementation-guide/HorizontalAlignment/Clothoid/";
+  struct Table {
+    const char* r1;
+    const char* r2;
+    double from;  // radius magnitudes, 0 for the tangent
+    double to;
+    bool left;
+  };
+  const Table tables[] = {{"inf", "300", 0.0, 300.0, true},        {"300", "inf", 300.0, 0.0, true},
+                          {"-inf", "-300", 0.0, 300.0, false},     {"-300", "-inf", 300.0, 0.0, false},
+                          {"1000", "300", 1000.0, 300.0, true},    {"300", "1000", 300.0, 1000.0, true},
+                          {"-1000", "-300", 1000.0, 300.0, false}, {"-300", "-1000", 300.0, 1000.0, false}};
+  for (const Table& t : tables) {
+    const std::string name = std::string("Horizontal_Clothoid_100.0_") + t.r1 + "_" + t.r2 + "_Meter.csv";
+    const auto rows = spiral_test::readNumericTable(svy_test::refdataPath(folder + name));
+    ASSERT_GT(rows.size(), 10u) << name;
+    const bool intoCurve = t.from == 0.0 || (t.to != 0.0 && t.to < t.from);
+    const CCurveSpiral spiral =
+        t.from == 0.0 || t.to == 0.0
+            ? makeSpiral(0.0, 0.0, 90.0, 100.0, t.from + t.to, !t.left, intoCurve)
+            : makePartialSpiral(0.0, 0.0, 90.0, 100.0, t.from, t.to, !t.left, intoCurve);
+    ASSERT_TRUE(spiral.isok()) << name;
+    for (const auto& row : rows) {
+      C2dPos pos;
+      ASSERT_TRUE(spiral.getPosAtLength(row[0], pos));
+      EXPECT_NEAR(pos.north(), row[2], 2e-6) << name << " s=" << row[0];
+      EXPECT_NEAR(pos.east(), row[1], 2e-6) << name << " s=" << row[0];
+      double length = 0.0;
+      double offset = 0.0;
+      ASSERT_TRUE(spiral.getLengthAndOffset(C2dPos(row[2], row[1]), length, offset));
+      EXPECT_NEAR(length, row[0], 3e-6) << name;
+      EXPECT_NEAR(offset, 0.0, 3e-6) << name;
+    }
+  }
 }
 
 }  // namespace

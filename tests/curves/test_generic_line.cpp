@@ -95,14 +95,6 @@ TEST(GenericLine, LineFromPointAndAzimuthIsThousandLongAndUnbounded) {
   EXPECT_NEAR(length, -5200.0, 1e-9);
 }
 
-TEST(GenericLine, DefaultIsZeroLineOnSegment) {
-  const CGenericLineImpl line;
-  EXPECT_EQ(line.getIntersectionType(), eIntersectOnSegment);
-  EXPECT_TRUE(line.isok());
-  EXPECT_EQ(line.getTotalLength(), 0.0);
-  EXPECT_EQ(line.getAzimuthAtLength(0.0), 0.0);
-}
-
 TEST(GenericLine, TinyAlongAndOffsetComeBackAsExactZero) {
   const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(100.0, 0.0));
   double length = 1.0;

@@ -48,18 +48,6 @@ TEST(TLine, AzimuthAndLengthFormMatchesTwoPointForm) {
   EXPECT_FALSE(box.empty);
 }
 
-TEST(TLine, InitializeReplacesTheEnds) {
-  TLine line;
-  line.initialize(C2dPos(0.0, 0.0), C2dPos(-3.0, 4.0));
-  EXPECT_NEAR(line.getTotalLength(), 5.0, 1e-15);
-  EXPECT_NEAR(line.getAzimuth().getRad(), std::atan2(4.0, -3.0), 1e-15);
-  line.initialize(C2dPos(1.0, 1.0), TAngle(svy_math::units::kPi), 2.0);
-  EXPECT_NEAR(line.getEndNorthing(), -1.0, 1e-15);
-  EXPECT_NEAR(line.getEndEasting(), 1.0, 1e-15);
-  const TLine copy(line);
-  EXPECT_EQ(copy.getEndPos(), line.getEndPos());
-}
-
 // Identity by class: cast follows the hierarchy upward and refuses sideways.
 TEST(SegmentRtti, CastFollowsTheHierarchy) {
   std::unique_ptr<CGenericSegment> segments[] = {
