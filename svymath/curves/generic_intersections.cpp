@@ -21,6 +21,21 @@ bool appendIf(bool accepted, const C2dPos& pos, svy_vector<C2dPos>& out) {
   return accepted;
 }
 
+// Neighbouring approximating arcs share their end points, so a crossing at a shared point is found by both.
+// Removes, from the points appended from index `first` on, each one closer than tol::kOffsetZero to an
+// earlier one of them.
+void removeRepeatedCrossings(svy_vector<C2dPos>& out, std::size_t first) {
+  std::size_t kept = first;
+  for (std::size_t i = first; i < out.size(); ++i) {
+    bool repeated = false;
+    for (std::size_t j = first; j < kept && !repeated; ++j) {
+      repeated = std::hypot(out[i].north() - out[j].north(), out[i].east() - out[j].east()) < tol::kOffsetZero;
+    }
+    if (!repeated) out[kept++] = out[i];
+  }
+  out.resize(kept);
+}
+
 }  // namespace
 
 bool intersectRays(const C2dPos& p0, const CMathAngle& a0, const C2dPos& p1, const CMathAngle& a1, C2dPos& out) {
@@ -102,20 +117,22 @@ bool intersectArcs(const CGenericArc& a, const CGenericArc& b, svy_vector<C2dPos
 bool intersectSpiralWith(const CGenericSpiral& spiral, const CGenericSegment& other, svy_vector<C2dPos>& out) {
   svy_vector<CCurveArc> arcs;
   if (!spiral.createCache(arcs)) return false;
-  bool found = false;
-  for (const CCurveArc& arc : arcs) found = arc.calcIntersections(other, out) || found;
-  return found;
+  const std::size_t first = out.size();
+  for (const CCurveArc& arc : arcs) arc.calcIntersections(other, out);
+  removeRepeatedCrossings(out, first);
+  return out.size() > first;
 }
 
 bool intersectSpirals(const CGenericSpiral& a, const CGenericSpiral& b, svy_vector<C2dPos>& out) {
   svy_vector<CCurveArc> arcsA;
   svy_vector<CCurveArc> arcsB;
   if (!a.createCache(arcsA) || !b.createCache(arcsB)) return false;
-  bool found = false;
+  const std::size_t first = out.size();
   for (const CCurveArc& arcA : arcsA) {
-    for (const CCurveArc& arcB : arcsB) found = intersectArcs(arcA, arcB, out) || found;
+    for (const CCurveArc& arcB : arcsB) intersectArcs(arcA, arcB, out);
   }
-  return found;
+  removeRepeatedCrossings(out, first);
+  return out.size() > first;
 }
 
 }  // namespace detail

@@ -15,7 +15,8 @@ bool intersectLines(const CGenericLine& a, const CGenericLine& b, svy_vector<C2d
 bool intersectLineArc(const CGenericLine& line, const CGenericArc& arc, svy_vector<C2dPos>& out);
 // Circle with circle, kept where both arcs' sweep tests accept the point.
 bool intersectArcs(const CGenericArc& a, const CGenericArc& b, svy_vector<C2dPos>& out);
-// A spiral with a line or an arc, through the spiral's 20-arc approximation.
+// A spiral with a line or an arc, through the spiral's 20-arc approximation. A crossing at a point shared by
+// two neighbouring arcs is reported once.
 bool intersectSpiralWith(const CGenericSpiral& spiral, const CGenericSegment& other, svy_vector<C2dPos>& out);
 // Spiral with spiral: every approximating arc of one with every approximating arc of the other.
 bool intersectSpirals(const CGenericSpiral& a, const CGenericSpiral& b, svy_vector<C2dPos>& out);

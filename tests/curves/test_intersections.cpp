@@ -189,6 +189,24 @@ TEST(SpiralIntersection, CrossingsLieOnTheApproximatingArcs) {
   EXPECT_GT(total, 10);
 }
 
+// A line square to the spiral at a point shared by two approximating arcs crosses both; it is one crossing.
+TEST(SpiralIntersection, CrossingAtSharedArcEndIsReportedOnce) {
+  const CCurveSpiral spiral = makeSpiral(0.0, 0.0, 0.0, 120.0, 150.0, true, true);  // arcs end every 6 m
+  for (const double node : {6.0, 12.0, 60.0, 114.0}) {
+    C2dPos on;
+    ASSERT_TRUE(spiral.getPosAtLength(node, on));
+    CMathAngle tangent;
+    ASSERT_TRUE(spiral.getAzimuthAtLength(node, tangent));
+    const CMathAngle normal = tangent + CMathAngle(90.0);
+    const CGenericLineImpl line(C2dPos(on.north() - 5.0 * normal.getCos(), on.east() - 5.0 * normal.getSin()), normal,
+                                10.0, eIntersectOnSegment);
+    const svy_vector<C2dPos> hits = crossings(spiral, line);
+    ASSERT_EQ(hits.size(), 1u) << node;
+    EXPECT_NEAR(hits[0].north(), on.north(), 1e-9);
+    EXPECT_NEAR(hits[0].east(), on.east(), 1e-9);
+  }
+}
+
 TEST(SpiralIntersection, SpiralWithArcAndSpiralWithSpiral) {
   const CCurveSpiral spiral = makeSpiral(0.0, 0.0, 0.0, 100.0, 200.0, true, true);
   const CCurveArc arc = makeArc(50.0, -30.0, 90.0, 80.0, 500.0, false);  // eastward, gently left
