@@ -145,3 +145,5 @@ class SVYMATH_API CMathAngle {
   mutable double m_sin;
   mutable double m_cos;
 };
+
+static_assert(sizeof(CMathAngle) == 3 * sizeof(double), "an angle is its radians, sine and cosine");

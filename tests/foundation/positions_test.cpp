@@ -29,35 +29,22 @@ TEST(AbstractPoint, ArraysOfPointsAreArraysOfDoubles) {
   EXPECT_EQ(P2::CreateFromPointer(values), P2(7, 8));
 }
 
-TEST(AbstractPoint, ComponentWiseArithmetic) {
+TEST(AbstractPoint, ProductsQuotientsAndExtremes) {
   const P3 a(1, -2, 3), b(4, 5, -6);
-  EXPECT_EQ(a + b, P3(5, 3, -3));
-  EXPECT_EQ(a - b, P3(-3, -7, 9));
-  EXPECT_EQ(-a, P3(-1, 2, -3));
-  EXPECT_EQ(a * 2.0, P3(2, -4, 6));
-  EXPECT_EQ(a / 2.0, P3(0.5, -1, 1.5));
-  EXPECT_EQ(a * b, 4 - 10 - 18);
+  EXPECT_EQ(a * b, 4 - 10 - 18);  // dot product
   EXPECT_EQ(b / a, P3(4, -2.5, -2));
   P3 c = a;
   c *= b;
   EXPECT_EQ(c, P3(4, -10, -18));
   c /= b;
   EXPECT_EQ(c, a);
-  c += b;
-  c -= b;
-  EXPECT_EQ(c, a);
-  c *= 3.0;
-  c /= 3.0;
-  EXPECT_EQ(c, a);
-  c.uminus();
-  EXPECT_EQ(c, -a);
   EXPECT_EQ(a.abs(), P3(1, 2, 3));
   EXPECT_EQ(a.maximum(b), P3(4, 5, 3));
   EXPECT_EQ(a.minimum(b), P3(1, -2, -6));
-  EXPECT_EQ(a.sum(), 2);
+  EXPECT_EQ((a - b + b) * 2.0 / 2.0, a);
+  EXPECT_EQ(-a + a, P3(0.0));
   EXPECT_EQ(P2(3, 4).Module(), 5);
-  EXPECT_EQ(P2(3, 4).ModuleSq(), 25);
-  EXPECT_EQ(P3(4, 9, 16).sqrt(), P3(2, 3, 4));
+  EXPECT_EQ(P3(4, 9, 16).sqrt().sum(), 9);
 }
 
 TEST(AbstractPoint, CrossProductIsOrthogonalWithLagrangeLength) {
@@ -106,32 +93,19 @@ INSTANTIATE_TEST_SUITE_P(Cases, PointConversion,
                                            PointCase{1e20, -1e20, 2147483647L, -2147483648L},
                                            PointCase{kNaN, 7.0, 0, 7}));
 
-TEST(PointConversion, FromPointAndSize) {
+TEST(PointConversion, FromPointSizeAndScalar) {
   POINT pt;
   pt.x = 3;
   pt.y = -4;
   EXPECT_EQ(P2(pt), P2(3, -4));
-  svy_math::TAbstractSize2<double> size(P2(10, 20));
+  const svy_math::TAbstractSize2<double> size(P2(10, 20));
   EXPECT_EQ(size.cx(), 10);
   EXPECT_EQ(size.cy(), 20);
-  size.cx() = 11;
-  EXPECT_EQ(size[0], 11);
-}
-
-TEST(Positions, NamedComponentsAndCoords) {
-  C2dPos p(100, 200);
-  EXPECT_EQ(p[0], 100);
-  EXPECT_EQ(p[1], 200);
-  p.north() += 1;
-  p.east() -= 1;
-  EXPECT_EQ(p, C2dPos(101, 199));
-  const C2dPos q = p - C2dPos(1, -1);
-  EXPECT_EQ(q, C2dPos(100, 200));
-  EXPECT_EQ(C2dPos(), C2dPos(0, 0));
   Coord c(1, 2, 3);
   c = 7.0;
   EXPECT_EQ(c, Coord(7, 7, 7));
-  EXPECT_EQ(c.x() + c.y() + c.z(), 21);
+  EXPECT_EQ(C2dPos(), C2dPos(0, 0));
+  EXPECT_EQ(C2dPos(1, 2).east(), 2);
 }
 
 TEST(Coords, RotateAroundZKeepsDistanceAndHeight) {
