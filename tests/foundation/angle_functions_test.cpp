@@ -112,6 +112,35 @@ TEST(RadianNormalizers, PassNonFiniteThroughAndSurviveHugeValues) {
   EXPECT_LT(r, kTwoPi);
 }
 
+struct Reducer {
+  const char* name;
+  double (*fn)(double);
+  double lo, hi;
+};
+
+// Every degree reduction ends on absurd input: NaN and infinities give NaN, huge values land in range.
+TEST(DegreeReductions, TerminateInRangeOnAbsurdInput) {
+  const Reducer reducers[] = {
+      {"ModDeg360", [](double x) { return ModDeg360(x, true); }, 0, 360},
+      {"ModDeg180", [](double x) { return ModDeg180(x, false); }, -180, 180},
+      {"pos360", pos360, 0, 360},
+      {"HR2HL", HR2HL, 0, 360},
+      {"Zenith2Level", Zenith2Level, 0, 360},
+      {"DDDMMSS2Deg", DDDMMSS2Deg, -361, 361},
+      {"Deg2DDDMMSS", [](double x) { return Deg2DDDMMSS(x, 4, false); }, -360, 360},
+      {"Deg2DDMMDEC", [](double x) { return Deg2DDMMDEC(x, 4, false); }, -360, 360},
+      {"Deg2Rad", [](double x) { return Deg2Rad(x, false); }, -kTwoPi, kTwoPi},
+  };
+  for (const Reducer& r : reducers) {
+    for (double x : {kNaN, kInf, -kInf}) EXPECT_TRUE(std::isnan(r.fn(x))) << r.name << " " << x;
+    for (double x : {1e300, -1e300, 1e17, -0.0, 4e-320}) {
+      const double y = r.fn(x);
+      EXPECT_GE(y, r.lo) << r.name << " " << x;
+      EXPECT_LE(y, r.hi) << r.name << " " << x;
+    }
+  }
+}
+
 TEST(DegreeReductions, ModDeg360AndModDeg180) {
   EXPECT_EQ(ModDeg360(-30, true), 330);
   EXPECT_EQ(ModDeg360(-30, false), -30);
