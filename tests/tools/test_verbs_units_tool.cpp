@@ -7,6 +7,7 @@
 
 #include <cmath>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace {
@@ -53,24 +54,42 @@ INSTANTIATE_TEST_SUITE_P(
                       Definition{"mmHg", "hPa", 1.33322387415, 1e-12},
                       Definition{"inHg", "hPa", 33.8639, 1e-12}));
 
-TEST(UnitRoundTrip, EveryUnitThereAndBackWithinItsQuantity) {
-  const std::vector<std::vector<std::string>> quantities = {
-      {"m", "ft", "ft-us", "ch", "ch-us"},
-      {"m2", "ft2", "ft2-us", "ch2", "ch2-us", "acre", "acre-us"},
-      {"m3", "yd3", "yd3-us", "ft3", "ft3-us", "ch3", "ch3-us"},
-      {"hPa", "mmHg"},
-      {"C", "F"}};
-  for (const auto& units : quantities) {
-    for (const std::string& from : units) {
-      for (const std::string& to : units) {
-        const double value = 1234.5678;
-        const svy_test::SvyResult there =
-            runSvy({"--full-precision", "units", "convert", "--from", from, "--to", to}, "1234.5678\n");
-        const svy_test::SvyResult back =
-            runSvy({"--full-precision", "units", "convert", "--from", to, "--to", from}, there.out);
-        ASSERT_EQ(back.exitStatus, 0) << back.err;
-        EXPECT_NEAR(std::stod(back.lines().at(1)), value, value * 1e-12) << from << " -> " << to;
+// Every conversion passes through the base unit of its quantity, so each unit's pair of functions is
+// covered by a trip from the base unit and back.
+TEST(UnitRoundTrip, EveryUnitThereAndBackFromItsBase) {
+  const std::vector<std::pair<std::string, std::vector<std::string>>> quantities = {
+      {"m", {"ft", "ft-us", "ch", "ch-us"}},
+      {"m2", {"ft2", "ft2-us", "ch2", "ch2-us", "acre", "acre-us"}},
+      {"m3", {"yd3", "yd3-us", "ft3", "ft3-us", "ch3", "ch3-us"}},
+      {"hPa", {"mmHg"}},
+      {"C", {"F"}}};
+  const std::string values = "1234.5678\n-0.001\n5e6\n";
+  for (const auto& [base, units] : quantities) {
+    for (const std::string& unit : units) {
+      const svy_test::SvyResult there =
+          runSvy({"--full-precision", "units", "convert", "--from", base, "--to", unit}, values);
+      const svy_test::SvyResult back =
+          runSvy({"--full-precision", "units", "convert", "--from", unit, "--to", base}, there.out);
+      ASSERT_EQ(back.exitStatus, 0) << back.err;
+      const std::vector<std::string> lines = back.lines();
+      ASSERT_EQ(lines.size(), 4u) << unit;
+      for (const auto& [line, value] : {std::pair{lines[1], 1234.5678}, {lines[2], -0.001}, {lines[3], 5e6}}) {
+        EXPECT_NEAR(std::stod(line), value, std::fabs(value) * 1e-12) << base << " -> " << unit;
       }
+    }
+  }
+}
+
+TEST(UnitRoundTrip, PackedFeetInchesKeepTheNearestEighth) {
+  // An eighth of an inch is 3.175 mm: a length read back from the packed form is within half of it.
+  for (const char* unit : {"fin", "fin-us"}) {
+    const svy_test::SvyResult there = runSvy({"units", "convert", "--from", "m", "--to", unit}, "0.5\n12.3456\n-250.01\n");
+    const svy_test::SvyResult back =
+        runSvy({"--full-precision", "units", "convert", "--from", unit, "--to", "m"}, there.out);
+    ASSERT_EQ(back.exitStatus, 0) << back.err;
+    const double expected[] = {0.5, 12.3456, -250.01};
+    for (std::size_t i = 0; i < 3; ++i) {
+      EXPECT_NEAR(std::stod(back.lines().at(i + 1)), expected[i], 0.0016) << unit << ' ' << expected[i];
     }
   }
 }
