@@ -41,18 +41,6 @@ TEST(ArcData, RadiusFallbackIsTinyLoggedAndCached) {
   EXPECT_EQ(capture.count(), 1u);
 }
 
-TEST(ArcData, RadiusDerivedFromLengthAndCentreAngle) {
-  CCurveDataArc data;
-  CMathAngle angle;
-  angle.setRad(0.25);
-  data.setCAngleR(angle, 80.0);
-  ASSERT_TRUE(data.setLen(10.0));  // keeps the radius, new angle
-  EXPECT_NEAR(data.getCenterAngle().getRad(), 0.125, 1e-15);
-  EXPECT_NEAR(data.getChordLength(), 2.0 * 80.0 * std::sin(0.0625), 1e-12);
-  EXPECT_FALSE(data.setLen(-1.0));
-  EXPECT_FALSE(data.SetElement(svy_math::undefinedValue(), 10.0, true));
-}
-
 TEST(ArcData, CircleAndDisplayFlags) {
   CCurveDataArc data;
   ASSERT_TRUE(data.setCircle(10.0, false));
@@ -110,6 +98,31 @@ INSTANTIATE_TEST_SUITE_P(Table, ArcStepTest,
                                            StepCase{1000.0, 500.0, 495.0, 0.01, 5.0},  // not past the end
                                            StepCase{50.0, 20.0, 3.0, 0.0, 17.0},       // no deviation: the rest
                                            StepCase{1000.0, 500.0, 500.0005, 0.01, 0.0}));
+
+// Walking an arc by deviation steps reaches its end, and every chord stays within the deviation of the arc.
+TEST(ArcElement, DeviationStepsWalkToTheEndWithinTheDeviation) {
+  const CCurveArc arc = makeArc(300.0, 400.0, 200.0, 180.0, 250.0, false);
+  double s = 0.0;
+  C2dPos previous = arc.getStartPos();
+  int steps = 0;
+  while (s < arc.getTotalLength() && steps < 1000) {
+    C2dPos next;
+    const double reached = arc.getNextPosForDeviation(s, 0.02, next);
+    ASSERT_GT(reached, s);
+    // Sagitta of the chord: distance from its midpoint to the arc point halfway along.
+    C2dPos halfway;
+    ASSERT_TRUE(arc.getPosAtLength(0.5 * (s + reached), halfway));
+    const double sagitta = std::hypot(0.5 * (previous.north() + next.north()) - halfway.north(),
+                                      0.5 * (previous.east() + next.east()) - halfway.east());
+    EXPECT_LE(sagitta, 0.02 + 1e-9);
+    s = reached;
+    previous = next;
+    ++steps;
+  }
+  EXPECT_NEAR(s, 180.0, 1e-12);
+  EXPECT_EQ(previous, arc.getEndPos());
+  EXPECT_EQ(steps, static_cast<int>(std::ceil(180.0 / (500.0 * std::acos(1.0 - 0.02 / 250.0)))));
+}
 
 TEST(ArcData, StepOutsideTheArcIsZeroAndLogged) {
   CCurveDataArc data;

@@ -115,49 +115,4 @@ TEST(GenericLine, ShortestDistanceUsesTheProlongedLineBeyondTheEnd) {
   EXPECT_FALSE(line.getLengthAndOffset(C2dPos(500.0, -3.0), length, offset));
 }
 
-TEST(GenericLine, AzimuthCurvatureAndStep) {
-  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(-10.0, -10.0));
-  EXPECT_NEAR(line.getAzimuthAtLength(3.0), -135.0, 1e-12);
-  CMathAngle start;
-  CMathAngle end;
-  ASSERT_TRUE(line.getStartAzimut(start));
-  ASSERT_TRUE(line.getEndAzimut(end));
-  EXPECT_EQ(start, end);
-  EXPECT_EQ(line.getCurvatureAtLength(1.0), 0.0);
-  EXPECT_NEAR(line.getStepForDeviation(4.0, 0.001), std::sqrt(200.0) - 4.0, 1e-12);
-  C2dPos next;
-  EXPECT_NEAR(line.getNextPosForDeviation(4.0, 0.001, next), std::sqrt(200.0), 1e-12);
-  EXPECT_NEAR(next.north(), -10.0, 1e-12);
-  EXPECT_NEAR(next.east(), -10.0, 1e-12);
-  const C2dMinMax box = line.getBoundary();
-  EXPECT_EQ(box.minNorth, -10.0);
-  EXPECT_EQ(box.maxEast, 0.0);
-  EXPECT_FALSE(box.empty);
-}
-
-TEST(GenericLine, AxisCrossingsAndInterpolation) {
-  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(10.0, 20.0));
-  C2dPos pos;
-  ASSERT_TRUE(line.calcHorizontalIntersection(5.0, pos));
-  EXPECT_NEAR(pos.east(), 10.0, 1e-12);
-  ASSERT_TRUE(line.calcVerticalIntersection(4.0, pos));
-  EXPECT_NEAR(pos.north(), 2.0, 1e-12);
-  EXPECT_FALSE(line.calcHorizontalIntersection(11.0, pos));  // beyond the end
-  double value = 0.0;
-  ASSERT_TRUE(line.interpolateNorthing(30.0, value));  // the prolonged line
-  EXPECT_NEAR(value, 15.0, 1e-12);
-  ASSERT_TRUE(line.interpolateEasting(-1.0, value));
-  EXPECT_NEAR(value, -2.0, 1e-12);
-  EXPECT_TRUE(line.checkNorthIsOnLine(10.0));
-  EXPECT_FALSE(line.checkEastIsOnLine(20.5));
-
-  const CGenericLineImpl northSouth(C2dPos(0.0, 7.0), C2dPos(10.0, 7.0));
-  EXPECT_TRUE(northSouth.isLineWithSameEasting());
-  EXPECT_FALSE(northSouth.isLineWithSameNorthing());
-  EXPECT_FALSE(northSouth.calcVerticalIntersection(7.0, pos));
-  EXPECT_FALSE(northSouth.interpolateNorthing(7.0, value));
-  EXPECT_TRUE(northSouth.checkEastIsOnLine(7.0));
-  EXPECT_FALSE(northSouth.checkEastIsOnLine(7.1));
-}
-
 }  // namespace
