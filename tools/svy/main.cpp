@@ -20,6 +20,8 @@ int main(int argc, char** argv) {
   registerUnitsVerbs(app);
   registerFitVerbs(app);
   registerCurveVerbs(app);
+  registerGeoVerbs(app);
+  registerTimeVerbs(app);
 
   try {
     app.parse(argc, argv);

@@ -14,3 +14,6 @@ void registerUnitsVerbs(CLI::App& app);
 void registerCurveVerbs(CLI::App& app);
 // "svy fit": least-squares best-fit line, circle and radius of plane points.
 void registerFitVerbs(CLI::App& app);
+// "svy geo" (geodetic, earth-centred, local east/north/up) and "svy time" (GPS time).
+void registerGeoVerbs(CLI::App& app);
+void registerTimeVerbs(CLI::App& app);

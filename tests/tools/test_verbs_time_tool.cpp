@@ -1,0 +1,137 @@
+// svy time to-gps and from-gps: published week anchors, the round trip between the two verbs over the whole
+// range, millisecond rounding that carries into the next day, and rejected rows.
+#include "svy_runner.h"
+
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+#include <cstdio>
+#include <string>
+#include <vector>
+
+namespace {
+
+using svy_test::runSvy;
+
+nlohmann::json runJson(const std::vector<std::string>& args, const std::string& input) {
+  std::vector<std::string> all = {"--json", "--full-precision"};
+  all.insert(all.end(), args.begin(), args.end());
+  const svy_test::SvyResult r = runSvy(all, input);
+  EXPECT_EQ(r.exitStatus, 0) << r.err;
+  return nlohmann::json::parse(r.out);
+}
+
+struct Anchor {
+  const char* time;
+  int week;
+  double secondsOfWeek;
+  int dayOfYear;
+};
+
+// The GPS epoch, both week-number rollovers, published anchors of GNSS software test suites, and day 366
+// of 2000 (a Sunday: 2000-01-01 was a Saturday, 52 weeks and a day before).
+const Anchor kAnchors[] = {{"1980-01-06T00:00:00.000", 0, 0.0, 6},
+                           {"1999-01-01T00:00:00.000", 990, 432000.0, 1},
+                           {"1999-08-22T00:00:00.000", 1024, 0.0, 234},
+                           {"2000-01-01T00:00:00.000", 1042, 518400.0, 1},
+                           {"2000-12-31T12:00:00.250", 1095, 43200.25, 366},
+                           {"2019-04-07T00:00:00.000", 2048, 0.0, 97}};
+
+TEST(TimeVerbs, PublishedAnchorsBothWays) {
+  std::string times;
+  std::string gps;
+  for (const Anchor& a : kAnchors) {
+    times += std::string(a.time) + "\n";
+    gps += std::to_string(a.week) + "," + std::to_string(a.secondsOfWeek) + "\n";
+  }
+  const nlohmann::json toGps = runJson({"time", "to-gps"}, times);
+  const nlohmann::json fromGps = runJson({"time", "from-gps"}, gps);
+  ASSERT_EQ(toGps.size(), std::size(kAnchors));
+  ASSERT_EQ(fromGps.size(), std::size(kAnchors));
+  for (std::size_t i = 0; i < std::size(kAnchors); ++i) {
+    EXPECT_EQ(toGps[i]["week"].get<double>(), kAnchors[i].week) << kAnchors[i].time;
+    EXPECT_NEAR(toGps[i]["seconds_of_week"].get<double>(), kAnchors[i].secondsOfWeek, 1e-6) << kAnchors[i].time;
+    EXPECT_EQ(fromGps[i]["time"].get<std::string>(), kAnchors[i].time);
+    EXPECT_EQ(fromGps[i]["day_of_year"].get<double>(), kAnchors[i].dayOfYear);
+  }
+}
+
+// Every 17th day from the epoch to the end of 2099, with a millisecond time of day that changes from row to
+// row: calendar text -> GPS -> the same text.
+TEST(TimeVerbs, RoundTripOverTheWholeRange) {
+  std::string times;
+  std::vector<std::string> expected;
+  int row = 0;
+  for (int year = 1980; year <= 2099; ++year) {
+    const bool leap = year % 4 == 0;
+    const int monthDays[12] = {31, leap ? 29 : 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
+    for (int month = 1; month <= 12; ++month) {
+      for (int day = 1; day <= monthDays[month - 1]; ++day) {
+        if ((year == 1980 && month == 1 && day < 6) || (year * 400 + month * 31 + day) % 17 != 0) continue;
+        const int millis = (row * 7919 + 123) % 86400000;
+        char text[40];
+        std::snprintf(text, sizeof text, "%04d-%02d-%02dT%02d:%02d:%02d.%03d", year, month, day,
+                      millis / 3600000, millis / 60000 % 60, millis / 1000 % 60, millis % 1000);
+        times += std::string(text) + "\n";
+        expected.emplace_back(text);
+        ++row;
+      }
+    }
+  }
+  const nlohmann::json gps = runJson({"time", "to-gps"}, times);
+  ASSERT_EQ(gps.size(), expected.size());
+  std::string gpsRows;
+  for (const auto& g : gps) {
+    char text[64];
+    std::snprintf(text, sizeof text, "%.0f,%.17g\n", g["week"].get<double>(), g["seconds_of_week"].get<double>());
+    gpsRows += text;
+  }
+  const nlohmann::json back = runJson({"time", "from-gps"}, gpsRows);
+  ASSERT_EQ(back.size(), expected.size());
+  for (std::size_t i = 0; i < expected.size(); ++i) EXPECT_EQ(back[i]["time"].get<std::string>(), expected[i]);
+}
+
+// Text is written to the millisecond: a time that rounds up to the next day, or week, shows that day.
+TEST(TimeVerbs, MillisecondRoundingCarriesIntoTheNextDayAndWeek) {
+  const nlohmann::json rows = runJson({"time", "from-gps"}, "0,86399.9996\n0,604799.9999\n2000,59.9996\n");
+  ASSERT_EQ(rows.size(), 3u);
+  EXPECT_EQ(rows[0]["time"].get<std::string>(), "1980-01-07T00:00:00.000");
+  EXPECT_EQ(rows[1]["time"].get<std::string>(), "1980-01-13T00:00:00.000");
+  EXPECT_EQ(rows[1]["day_of_year"].get<double>(), 13);
+  EXPECT_EQ(rows[2]["time"].get<std::string>(), "2018-05-06T00:01:00.000");
+}
+
+struct RejectedRow {
+  const char* verb;
+  const char* row;
+  const char* message;
+};
+
+class TimeRejectedRow : public ::testing::TestWithParam<RejectedRow> {};
+
+TEST_P(TimeRejectedRow, IsReportedAndTheGoodRowStillWritten) {
+  const RejectedRow& c = GetParam();
+  const std::string good = std::string(c.verb) == "to-gps" ? "2020-01-01T00:00:00" : "2000,0";
+  const svy_test::SvyResult r = runSvy({"time", c.verb}, good + "\n" + c.row + "\n");
+  EXPECT_EQ(r.exitStatus, 1) << r.out;
+  EXPECT_EQ(r.lines().size(), 2u) << r.out;
+  ASSERT_EQ(r.errLines().size(), 1u) << r.err;
+  EXPECT_EQ(r.errLines()[0].rfind(std::string("svy: line 2: ") + c.message, 0), 0u) << r.err;
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    OutOfRangeOrMalformed, TimeRejectedRow,
+    ::testing::Values(RejectedRow{"to-gps", "2021-02-29T00:00:00", "no such date or time"},
+                      RejectedRow{"to-gps", "2020-13-01T00:00:00", "no such date or time"},
+                      RejectedRow{"to-gps", "2020-01-01T24:00:00", "no such date or time"},
+                      RejectedRow{"to-gps", "2020-01-01T00:00:60", "no such date or time"},
+                      RejectedRow{"to-gps", "1980-01-05T23:59:59.999", "times run from the GPS epoch"},
+                      RejectedRow{"to-gps", "2100-01-01T00:00:00", "times run from the GPS epoch"},
+                      RejectedRow{"to-gps", "2020-01-01 00:00:00", "expected a time"},
+                      RejectedRow{"to-gps", "2020-01-01T00:00:00.", "expected a time"},
+                      RejectedRow{"from-gps", "-1,0", "the week must be a whole number"},
+                      RejectedRow{"from-gps", "1.5,0", "the week must be a whole number"},
+                      RejectedRow{"from-gps", "0,604800", "seconds of week must lie in"},
+                      RejectedRow{"from-gps", "6260,432000", "times run to 2099-12-31"}));
+
+}  // namespace

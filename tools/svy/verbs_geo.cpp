@@ -1,0 +1,147 @@
+// svy geo: geodetic (latitude, longitude in degrees, ellipsoidal height in metres) and earth-centred
+// Cartesian coordinates (X, Y, Z in metres) on the library's reference ellipsoid, and local east/north/up
+// differences with azimuth, elevation and slope distance from an origin.
+#include "row_io.h"
+#include "verbs.h"
+
+#include "svymath/foundation/constants.h"
+#include "svymath/geodesy/geo_coord.h"
+#include "svymath/geodesy/local_frame.h"
+
+#include <CLI/CLI.hpp>
+
+#include <cmath>
+#include <limits>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace {
+
+using svy_math::units::kDegToRad;
+using svy_math::units::kRadToDeg;
+
+// Written decimals: 1e-9 degree of latitude is 0.1 mm on the ground; lengths to 0.1 mm; directions to
+// 1e-7 degree (0.02 mm at 100 m).
+constexpr int kLatLonDecimals = 9;
+constexpr int kLengthDecimals = 4;
+constexpr int kDirectionDecimals = 7;
+constexpr double kMaxLatitudeDeg = 90.0;
+constexpr double kHalfTurnDeg = 180.0;
+constexpr double kFullTurnDeg = 360.0;
+
+bool isLatitude(double latDeg) { return std::fabs(latDeg) <= kMaxLatitudeDeg; }
+
+// The library's longitude lies in [0, 360); written in (-180, 180] as users read longitudes.
+double signedLongitudeDeg(double lonRad) {
+  const double deg = lonRad * kRadToDeg;
+  return deg > kHalfTurnDeg ? deg - kFullTurnDeg : deg;
+}
+
+// Parses "LAT,LON,H" (degrees, degrees, metres).
+bool parseOrigin(const std::string& text, GeoCoord& origin) {
+  const std::string::size_type first = text.find(',');
+  const std::string::size_type second = first == std::string::npos ? first : text.find(',', first + 1);
+  if (second == std::string::npos) return false;
+  double lat = 0.0, lon = 0.0, h = 0.0;
+  if (!svy_tool::parseNumber(text.substr(0, first), lat) ||
+      !svy_tool::parseNumber(text.substr(first + 1, second - first - 1), lon) ||
+      !svy_tool::parseNumber(text.substr(second + 1), h) || !isLatitude(lat))
+    return false;
+  origin = GeoCoord(lat * kDegToRad, lon * kDegToRad, h);
+  return true;
+}
+
+void addToEcef(CLI::App& family) {
+  CLI::App* verb = family.add_subcommand("to-ecef", "Geodetic to earth-centred Cartesian: rows lat_deg,lon_deg,h");
+  const std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
+  verb->callback([verb, input] {
+    const svy_tool::RowFormat format{
+        {"lat_deg", "lon_deg", "h"}, true, {{"x", kLengthDecimals}, {"y", kLengthDecimals}, {"z", kLengthDecimals}}};
+    svy_tool::finishVerb(svy_tool::runRows(
+        *input, format, svy_tool::outputOptionsFor(*verb),
+        [](const svy_tool::InputRow& row, std::vector<svy_tool::Cell>& out, std::string& error) {
+          const std::vector<double>& v = row.numbers;
+          if (!isLatitude(v[0])) {
+            error = "latitude must lie within -90 to 90 degrees";
+            return false;
+          }
+          Coord c;
+          c.blh2xyz(GeoCoord(v[0] * kDegToRad, v[1] * kDegToRad, v[2]));
+          out = {c.x(), c.y(), c.z()};
+          return true;
+        }));
+  });
+}
+
+void addToGeodetic(CLI::App& family) {
+  CLI::App* verb = family.add_subcommand("to-geodetic", "Earth-centred Cartesian to geodetic: rows x,y,z");
+  const std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
+  verb->callback([verb, input] {
+    const svy_tool::RowFormat format{
+        {"x", "y", "z"}, true, {{"lat_deg", kLatLonDecimals}, {"lon_deg", kLatLonDecimals}, {"h", kLengthDecimals}}};
+    svy_tool::finishVerb(svy_tool::runRows(
+        *input, format, svy_tool::outputOptionsFor(*verb),
+        [](const svy_tool::InputRow& row, std::vector<svy_tool::Cell>& out, std::string& error) {
+          GeoCoord g;
+          g.xyz2blh(Coord(row.numbers[0], row.numbers[1], row.numbers[2]));
+          if (!std::isfinite(g.lat()) || !std::isfinite(g.lon()) || !std::isfinite(g.height())) {
+            error = "no geodetic position for this point";
+            return false;
+          }
+          out = {g.lat() * kRadToDeg, signedLongitudeDeg(g.lon()), g.height()};
+          return true;
+        }));
+  });
+}
+
+void addEnu(CLI::App& family) {
+  CLI::App* verb = family.add_subcommand(
+      "enu", "East, north, up, azimuth, elevation and distance from an origin to earth-centred points: rows x,y,z");
+  const std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
+  const std::shared_ptr<std::string> originText = std::make_shared<std::string>();
+  verb->add_option("--origin", *originText, "Origin LAT,LON,H (degrees, degrees, metres)")->required();
+  verb->callback([verb, input, originText] {
+    GeoCoord origin;
+    if (!parseOrigin(*originText, origin))
+      throw CLI::ValidationError("--origin: expected LAT,LON,H with latitude within -90 to 90, got '" +
+                                 *originText + "'");
+    Coord originXyz;
+    originXyz.blh2xyz(origin);
+    const svy_tool::RowFormat format{{"x", "y", "z"},
+                                     true,
+                                     {{"east", kLengthDecimals},
+                                      {"north", kLengthDecimals},
+                                      {"up", kLengthDecimals},
+                                      {"azimuth_deg", kDirectionDecimals},
+                                      {"elevation_deg", kDirectionDecimals},
+                                      {"distance", kLengthDecimals}}};
+    svy_tool::finishVerb(svy_tool::runRows(
+        *input, format, svy_tool::outputOptionsFor(*verb),
+        [origin, originXyz](const svy_tool::InputRow& row, std::vector<svy_tool::Cell>& out, std::string&) {
+          const Coord target(row.numbers[0], row.numbers[1], row.numbers[2]);
+          const svy_math::TAbstractPoint3<double> enu = blh_to_neu(origin, target - originXyz);
+          const svy_math::TAbstractPoint3<double> polar = neu_to_polar(enu);
+          // A point at the origin has no direction: the library marks it with the largest double.
+          const bool hasDirection = polar[1] != std::numeric_limits<double>::max();
+          const double nan = std::numeric_limits<double>::quiet_NaN();
+          out = {enu[0],
+                 enu[1],
+                 enu[2],
+                 hasDirection ? polar[1] * kRadToDeg : nan,
+                 hasDirection ? polar[0] * kRadToDeg : nan,
+                 polar[2]};
+          return true;
+        }));
+  });
+}
+
+}  // namespace
+
+void registerGeoVerbs(CLI::App& app) {
+  CLI::App* family = app.add_subcommand("geo", "Geodetic, earth-centred and local east/north/up coordinates");
+  family->require_subcommand(1);
+  addToEcef(*family);
+  addToGeodetic(*family);
+  addEnu(*family);
+}
