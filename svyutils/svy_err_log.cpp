@@ -33,14 +33,19 @@ CSinkSlot& sinkSlot() {
 
 }  // namespace
 
-void svy_err_log(const char* file, int line, const char* message) {
+void svy_err_log(const char* file, int line, const char* message) noexcept {
   const auto sink = sinkSlot().get();
   if (!sink) return;
-  TErrLogEntry entry;
-  entry.file = file != nullptr ? file : "";
-  entry.line = line;
-  entry.message = message != nullptr ? message : "";
-  (*sink)(entry);
+  // Logging never changes a result: a sink that throws (or memory running out) loses the entry only.
+  try {
+    TErrLogEntry entry;
+    entry.file = file != nullptr ? file : "";
+    entry.line = line;
+    entry.message = message != nullptr ? message : "";
+    (*sink)(entry);
+  } catch (...) {
+    return;
+  }
 }
 
 TErrLogSink setErrLogSink(TErrLogSink sink) { return sinkSlot().exchange(std::move(sink)); }

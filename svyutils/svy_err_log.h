@@ -20,13 +20,15 @@ struct TErrLogEntry {
 
 using TErrLogSink = std::function<void(const TErrLogEntry&)>;
 
-SVYUTILS_API void svy_err_log(const char* file, int line, const char* message);
+// Null file or message pointers are logged as empty texts. An exception from the sink is swallowed.
+SVYUTILS_API void svy_err_log(const char* file, int line, const char* message) noexcept;
 
 // Installs sink (an empty function removes it) and returns the one it replaces. The sink is called
 // outside the log's lock, so it may itself log; it must be safe to call from several threads at once.
 SVYUTILS_API TErrLogSink setErrLogSink(TErrLogSink sink);
 
-// Collects the entries logged while it lives (on any thread), then restores the previous sink.
+// Collects the entries logged while it lives (on any thread), then restores the previous sink. Captures
+// nest: an inner capture must end before the outer one.
 class SVYUTILS_API CScopedErrLogCapture {
  public:
   CScopedErrLogCapture();

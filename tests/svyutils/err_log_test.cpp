@@ -2,6 +2,7 @@
 
 #include <atomic>
 #include <map>
+#include <stdexcept>
 #include <string>
 #include <thread>
 #include <vector>
@@ -55,6 +56,13 @@ TEST(ErrLogSink, InstallReturnsThePreviousSinkAndEmptyRemovesIt) {
   mine(svy_logging::TErrLogEntry{});
   EXPECT_EQ(calls, 2);
   svy_logging::setErrLogSink(original);
+}
+
+TEST(ErrLogSink, AThrowingSinkDoesNotReachTheCaller) {
+  const auto previous =
+      svy_logging::setErrLogSink([](const svy_logging::TErrLogEntry&) { throw std::runtime_error("sink"); });
+  EXPECT_NO_THROW(svy_err_log("mathAlnts", 5, ""));
+  svy_logging::setErrLogSink(previous);
 }
 
 TEST(ErrLogSink, ASinkMayLogWithoutDeadlock) {
