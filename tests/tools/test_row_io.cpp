@@ -83,6 +83,12 @@ TEST(RowReader, NumericHeaderRecognisedByItsTextEvenWithOtherNames) {
   EXPECT_EQ(rows[0].lineNumber, 2u);
 }
 
+TEST(RowReader, MistypedFirstNumberIsDataNotAHeader) {
+  const auto rows = readAll("1O,2\n3,4\n", {"n", "e"}, true);
+  ASSERT_EQ(rows.size(), 2u);
+  EXPECT_EQ(rows[0].fields[0], "1O");
+}
+
 TEST(RowReader, OnlyTheFirstContentLineCanBeAHeader) {
   const auto rows = readAll("1,2\nn,e\n", {"n", "e"}, true);
   ASSERT_EQ(rows.size(), 2u);

@@ -169,9 +169,11 @@ bool RowReader::isHeader(const std::vector<std::string>& fields) const {
       std::equal(fields.begin(), fields.end(), inputNames_.begin(), equalNoCase)) {
     return true;
   }
-  if (!numericInput_) return false;
-  double ignored = 0.0;
-  return std::none_of(fields.begin(), fields.end(), [&](const std::string& f) { return parseNumber(f, ignored); });
+  // Otherwise, for numbers, a line of names: every field starts with a letter. A mistyped first number such
+  // as "1O" is therefore reported as a bad row instead of being skipped as a header.
+  return numericInput_ && std::all_of(fields.begin(), fields.end(), [](const std::string& f) {
+           return !f.empty() && (std::isalpha(static_cast<unsigned char>(f[0])) || f[0] == '_');
+         });
 }
 
 bool RowReader::next(InputRow& row) {

@@ -4,7 +4,7 @@
 // Input: CSV rows from a file, or from stdin when the path is empty or "-". Blank lines and lines whose first
 // non-blank character is '#' are skipped; fields are trimmed; double-quoted fields may hold commas ("" is a
 // quote). The first content line is taken as a header and skipped when its fields equal the verb's input
-// column names (any case), or, for numeric input, when none of its fields is a number. Line numbers count
+// column names (any case), or, for numeric input, when every field starts with a letter (a line of names). Line numbers count
 // every physical line from 1, so that a message points at the line a user sees in an editor.
 //
 // Output: a CSV header line and one line per row, or with --json one JSON array of objects keyed by column
