@@ -9,7 +9,7 @@
 #include "support/refdata.h"
 #include "svymath/curves/curve_arc.h"
 #include "svyutils/svy_err_log.h"
-#include "test_curve_primitives_support.h"
+#include "test_generic_support.h"
 #include "test_spiral_support.h"
 
 namespace {

@@ -5,7 +5,7 @@
 #include <cmath>
 
 #include "svyutils/svy_err_log.h"
-#include "test_curve_primitives_support.h"
+#include "test_generic_support.h"
 
 namespace {
 

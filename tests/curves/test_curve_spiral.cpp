@@ -6,7 +6,7 @@
 #include <string>
 
 #include "support/refdata.h"
-#include "test_curve_primitives_support.h"
+#include "test_generic_support.h"
 #include "test_spiral_support.h"
 
 namespace {

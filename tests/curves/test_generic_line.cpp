@@ -5,7 +5,7 @@
 #include <cmath>
 
 #include "svymath/curves/generic_line_impl.h"
-#include "test_curve_primitives_support.h"
+#include "test_generic_support.h"
 
 namespace {
 

@@ -10,7 +10,7 @@
 #include "svymath/curves/generic_line_impl.h"
 #include "svymath/curves/tline.h"
 #include "svyutils/svy_err_log.h"
-#include "test_curve_primitives_support.h"
+#include "test_generic_support.h"
 
 namespace {
 

@@ -7,7 +7,7 @@
 
 #include "svymath/curves/generic_line_impl.h"
 #include "svymath/curves/tline.h"
-#include "test_curve_primitives_support.h"
+#include "test_generic_support.h"
 
 namespace {
 
