@@ -89,6 +89,8 @@ class SVYMATH_API TNonLinearLeastSquaresData : public TLeastSquaresData {
 
 // One weighted linear solution; solution is cleared and then receives X in order.
 //
+// W must be symmetric (a weight matrix is): the normal matrix is built from its lower triangle. Any
+// non-finite element of A, Y or W gives eLsqNotFinite.
 // The normal matrix is inverted through its Cholesky factor; a pivot at or below 1e-14 of its diagonal
 // element makes it singular (eLsqSingular). The solution is then refined by solving again for the residuals
 // Y - A X (computed from the original A and Y): this recovers the digits that forming A^T W A loses when
