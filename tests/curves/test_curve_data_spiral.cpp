@@ -286,7 +286,8 @@ TEST(SpiralDataCopy, CopiesOwnTheirLaw) {
   EXPECT_EQ(b.getTotalLength(), 100.0);
   EXPECT_EQ(c.getTotalLength(), 100.0);
   EXPECT_EQ(c.getSpiralMathType(), eMathSpiralCubic);
-  c = c;
+  const CCurveDataSpiral& same = c;
+  c = same;  // self-assignment keeps the law
   EXPECT_EQ(c.getTotalLength(), 100.0);
   // A new law keeps the definition.
   ASSERT_TRUE(b.recreateSimpleSpiral(eMathSpiralEuler));

@@ -7,7 +7,6 @@
 #include <cmath>
 #include <limits>
 #include <map>
-#include <memory>
 #include <string>
 #include <utility>
 
@@ -187,18 +186,6 @@ TEST(CubicRange, SnapsAndLogsLikeTheClothoid) {
   CCubicSpiralTStoSC undefined;
   EXPECT_FALSE(undefined.getPosAtLength(0.0, n, e));
   EXPECT_EQ(capture.count(), 2u);
-}
-
-TEST(CubicCopy, CopiesOnlySameLaw) {
-  CCubicSpiralTStoSC a;
-  CCubicSpiralTStoSC b;
-  ASSERT_TRUE(a.setLenAndR(100.0, 300.0, true));
-  ASSERT_TRUE(b.copy(&a));
-  EXPECT_EQ(b.getCubicCoefficient(), a.getCubicCoefficient());
-  EXPECT_EQ(b.getLength(), 100.0);
-  std::unique_ptr<CCurveSpiralTStoSCBase> c(a.clone());
-  EXPECT_EQ(c->getMathSpiralType(), eMathSpiralCubic);
-  EXPECT_EQ(c->getFinalNorthing(), a.getFinalNorthing());
 }
 
 }  // namespace
