@@ -42,6 +42,7 @@ class SVYMATH_API CCurveDataSpiral : public CCurveDataSpiral1R {
 
  protected:
   void onDefinitionChanged() override;
+  void onSpiralRedefined() override { m_startOffset = 0.0; }
 
  private:
   // Signed radius (element's side) at law length s; 0 where the law is straight.

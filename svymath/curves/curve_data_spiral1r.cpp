@@ -83,6 +83,7 @@ bool CCurveDataSpiral1R::recreateSimpleSpiral(AlntMathSpiralType type) {
 bool CCurveDataSpiral1R::setLenAndR(double L, double R, bool toTheRight, bool isTSSC) {
   const bool ok = m_law->setLenAndR(L, R, isTSSC ? toTheRight : !toTheRight);
   m_isTSSC = isTSSC;
+  onSpiralRedefined();
   onDefinitionChanged();
   return ok;
 }
@@ -96,6 +97,7 @@ bool CCurveDataSpiral1R::setLenAndR(double L, AlntElementLengthDisplay lengthDis
 bool CCurveDataSpiral1R::setLenAndSpPrm(double L, double K, bool isTSSC) {
   const bool ok = m_law->setLenAndSpPrm(L, isTSSC ? K : -K);
   m_isTSSC = isTSSC;
+  onSpiralRedefined();
   onDefinitionChanged();
   return ok;
 }

@@ -113,6 +113,9 @@ class SVYMATH_API CCurveDataSpiral1R {
   double fullStepForDeviation(double s, double dev, double limit) const;
   // Called after every change of the law or direction (the partial spiral re-derives its placement).
   virtual void onDefinitionChanged() {}
+  // Called when the law is defined anew from a length and a radius or constant (a partial spiral becomes
+  // the full one); onDefinitionChanged follows.
+  virtual void onSpiralRedefined() {}
 
   CCurveSpiralTStoSCBase* m_law;
   bool m_isTSSC = true;

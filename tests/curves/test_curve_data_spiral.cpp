@@ -273,6 +273,10 @@ TEST(SpiralDataTangentEnd, TwoRadiiWithTangentGiveFullSpiral) {
   EXPECT_FALSE(byOffset.setStartOffset(1e6));
   EXPECT_NEAR(byOffset.getFinalNorthing(), byRadii.getFinalNorthing(), 1e-12);
   EXPECT_NEAR(byOffset.getFinalEasting(), byRadii.getFinalEasting(), 1e-12);
+  // Defining a part anew by length and radius makes it the full spiral again.
+  ASSERT_TRUE(byRadii.setLenAndR(70.0, 300.0, true, true));
+  EXPECT_FALSE(byRadii.isCompoundSpiral());
+  EXPECT_EQ(byRadii.getTotalLength(), 70.0);
 }
 
 TEST(SpiralDataCopy, CopiesOwnTheirLaw) {
