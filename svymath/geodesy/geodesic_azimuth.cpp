@@ -1,8 +1,11 @@
 // CMathAngle::setAzFromLatLon: the forward azimuth of the geodesic (the shortest path on the reference
 // ellipsoid) from one geodetic position to another, by the classic iterative inverse on the auxiliary
-// sphere of reduced latitudes. The iteration is capped; for nearly antipodal pairs, where it does not
-// settle, the azimuth of the great circle on the auxiliary sphere is taken instead (approximate there:
-// near the antipode the direction of the shortest path changes quickly with position anyway).
+// sphere of reduced latitudes. Every iteration is capped. For nearly antipodal pairs, where the classic
+// iteration oscillates, a damped iteration follows; the few pairs (within about half a degree of the
+// antipode) where that too fails take the azimuth of the great circle on the auxiliary sphere, which can be
+// far from the geodesic's there: so close to the antipode the direction of the shortest path changes by
+// tens of degrees over a few kilometres anyway.
+#include <algorithm>
 #include <cmath>
 
 #include "svymath/foundation/constants.h"
@@ -27,6 +30,38 @@ double sphereAzimuth(const ReducedLatitude& p1, const ReducedLatitude& p2, doubl
   return std::atan2(p2.cosU * std::sin(lambda), p1.cosU * p2.sinU - p1.sinU * p2.cosU * std::cos(lambda));
 }
 
+enum class LongitudeIteration { kConverged, kCoincident, kNotConverged };
+
+// Iterates the longitude difference lambda on the auxiliary sphere, moving each step by `relaxation` times
+// the classic update (1: the classic iteration; below 1: damped, which settles in part of the nearly
+// antipodal region where the classic one oscillates).
+LongitudeIteration iterateLongitude(const ReducedLatitude& p1, const ReducedLatitude& p2, double dLon, double f,
+                                    double relaxation, int cap, double& lambda) {
+  lambda = dLon;
+  for (int step = 0; step < cap; ++step) {
+    const double sinLambda = std::sin(lambda);
+    const double cosLambda = std::cos(lambda);
+    const double a = p2.cosU * sinLambda;
+    const double b = p1.cosU * p2.sinU - p1.sinU * p2.cosU * cosLambda;
+    const double sinSigma = std::sqrt(a * a + b * b);
+    const double cosSigma = p1.sinU * p2.sinU + p1.cosU * p2.cosU * cosLambda;
+    if (sinSigma == 0.0) return cosSigma > 0.0 ? LongitudeIteration::kCoincident : LongitudeIteration::kNotConverged;
+    const double sigma = std::atan2(sinSigma, cosSigma);
+    const double sinAlpha = p1.cosU * p2.cosU * sinLambda / sinSigma;
+    const double cos2Alpha = 1.0 - sinAlpha * sinAlpha;
+    // On the equator (cos^2 alpha = 0) the midpoint term vanishes.
+    const double cos2SigmaM = cos2Alpha != 0.0 ? cosSigma - 2.0 * p1.sinU * p2.sinU / cos2Alpha : 0.0;
+    const double c = f / 16.0 * cos2Alpha * (4.0 + f * (4.0 - 3.0 * cos2Alpha));
+    const double next =
+        dLon + (1.0 - c) * f * sinAlpha *
+                   (sigma + c * sinSigma * (cos2SigmaM + c * cosSigma * (-1.0 + 2.0 * cos2SigmaM * cos2SigmaM)));
+    const double change = relaxation * (next - lambda);
+    lambda = std::max(-svy_math::units::kPi, std::min(svy_math::units::kPi, lambda + change));
+    if (std::fabs(change) < svy_math::tol::kGeodesicLongitude) return LongitudeIteration::kConverged;
+  }
+  return LongitudeIteration::kNotConverged;
+}
+
 bool isLatitude(double lat) { return std::isfinite(lat) && std::fabs(lat) <= svy_math::units::kHalfPi; }
 
 }  // namespace
@@ -40,36 +75,10 @@ bool CMathAngle::setAzFromLatLon(double lat1, double lon1, double lat2, double l
   const double dLon = std::remainder(lon2 - lon1, svy_math::units::kTwoPi);
 
   double lambda = dLon;
-  for (int step = 0; step < svy_math::tol::kGeodesicIterationCap; ++step) {
-    const double sinLambda = std::sin(lambda);
-    const double cosLambda = std::cos(lambda);
-    const double a = p2.cosU * sinLambda;
-    const double b = p1.cosU * p2.sinU - p1.sinU * p2.cosU * cosLambda;
-    const double sinSigma = std::sqrt(a * a + b * b);
-    if (sinSigma == 0.0) {
-      // Coincident points give no direction; exactly antipodal ones leave the azimuth to the fallback.
-      const double cosSigma = p1.sinU * p2.sinU + p1.cosU * p2.cosU * cosLambda;
-      if (cosSigma > 0.0) return false;
-      break;
-    }
-    const double cosSigma = p1.sinU * p2.sinU + p1.cosU * p2.cosU * cosLambda;
-    const double sigma = std::atan2(sinSigma, cosSigma);
-    const double sinAlpha = p1.cosU * p2.cosU * sinLambda / sinSigma;
-    const double cos2Alpha = 1.0 - sinAlpha * sinAlpha;
-    // On the equator (cos^2 alpha = 0) the midpoint term vanishes.
-    const double cos2SigmaM = cos2Alpha != 0.0 ? cosSigma - 2.0 * p1.sinU * p2.sinU / cos2Alpha : 0.0;
-    const double c = f / 16.0 * cos2Alpha * (4.0 + f * (4.0 - 3.0 * cos2Alpha));
-    const double next =
-        dLon + (1.0 - c) * f * sinAlpha *
-                   (sigma + c * sinSigma * (cos2SigmaM + c * cosSigma * (-1.0 + 2.0 * cos2SigmaM * cos2SigmaM)));
-    if (!(std::fabs(next) <= svy_math::units::kPi)) break;  // beyond the antipode: no convergence
-    const double change = next - lambda;
-    lambda = next;
-    if (std::fabs(change) < svy_math::tol::kGeodesicLongitude) {
-      setRad(sphereAzimuth(p1, p2, lambda));
-      return true;
-    }
-  }
-  setRad(sphereAzimuth(p1, p2, dLon));
+  LongitudeIteration result = iterateLongitude(p1, p2, dLon, f, 1.0, svy_math::tol::kGeodesicIterationCap, lambda);
+  if (result == LongitudeIteration::kCoincident) return false;
+  if (result == LongitudeIteration::kNotConverged)
+    result = iterateLongitude(p1, p2, dLon, f, svy_math::tol::kGeodesicRelaxation, svy_math::tol::kGeodesicDampedCap, lambda);
+  setRad(sphereAzimuth(p1, p2, result == LongitudeIteration::kConverged ? lambda : dLon));
   return true;
 }
