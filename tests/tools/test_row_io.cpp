@@ -140,6 +140,12 @@ TEST(RowWriter, JsonRoundsLikeCsvUnlessFullPrecision) {
   EXPECT_EQ(full.str(), "[\n{\"d\":0.3333333333333333}\n]\n");
 }
 
+TEST(RowWriter, JsonReplacesInvalidUtf8InEchoedText) {
+  std::ostringstream json;
+  svy_tool::RowWriter(json, {{"text", 0}}, {true, false}).write({Cell{std::string("1+2\xE9")}});
+  EXPECT_EQ(json.str(), "[\n{\"text\":\"1+2\xEF\xBF\xBD\"}\n]\n");
+}
+
 // Counts rows through runRows() with a handler that doubles a number and refuses negatives.
 TEST(RunRows, BadRowsReportedGoodRowsWritten) {
   std::istringstream in("x\n1\n2,3\n-1\nabc\n4\n");

@@ -4,6 +4,7 @@
 
 #include <CLI/CLI.hpp>
 
+#include <exception>
 #include <iostream>
 
 int main(int argc, char** argv) {
@@ -35,6 +36,10 @@ int main(int argc, char** argv) {
   } catch (const CLI::Error& e) {
     std::cerr << "svy: " << e.what() << '\n';
     return svy_tool::kExitUsage;
+  } catch (const std::exception& e) {
+    // Out of memory or a fault in a verb: still one line and a failing status, never an abort.
+    std::cerr << "svy: " << e.what() << '\n';
+    return svy_tool::kExitBadRows;
   }
   return svy_tool::kExitOk;
 }

@@ -245,7 +245,10 @@ void RowWriter::write(const std::vector<Cell>& cells) {
       if (!options_.fullPrecision && std::isfinite(value)) parseNumber(formatNumber(value, column.decimals), shown);
       object[column.name] = shown;
     }
-    out_ << (rowsWritten_ ? ",\n" : "\n") << object.dump();
+    // Text echoed from the input may not be valid UTF-8 (a file in a legacy code page): such bytes are
+    // written as U+FFFD instead of failing the whole output.
+    out_ << (rowsWritten_ ? ",\n" : "\n")
+         << object.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace);
   } else {
     for (std::size_t i = 0; i < count; ++i) out_ << (i ? "," : "") << csvCell(cells[i], columns_[i]);
     out_ << '\n';
