@@ -19,23 +19,22 @@ double convert(const std::string& from, const std::string& to, const std::string
 
 struct Equivalent {
   const char* unit;
-  const char* quarterTurn;  // 90 degrees in this unit
+  const char* quarterTurnText;  // 90 degrees in this unit, as typed
+  double quarterTurn;
 };
 
 class AngleConvert : public ::testing::TestWithParam<Equivalent> {};
 
 TEST_P(AngleConvert, QuarterTurnInEveryUnit) {
   const Equivalent& c = GetParam();
-  double expected = 0.0;
-  std::sscanf(c.quarterTurn, "%lf", &expected);
-  EXPECT_NEAR(convert("deg", c.unit, "90"), expected, 1e-12);
-  EXPECT_NEAR(convert(c.unit, "deg", c.quarterTurn), 90.0, 1e-12);
+  EXPECT_NEAR(convert("deg", c.unit, "90"), c.quarterTurn, 1e-12);
+  EXPECT_NEAR(convert(c.unit, "deg", c.quarterTurnText), 90.0, 1e-12);
 }
 
 INSTANTIATE_TEST_SUITE_P(Units, AngleConvert,
-                         ::testing::Values(Equivalent{"rad", "1.5707963267948966"}, Equivalent{"grad", "100"},
-                                           Equivalent{"mil", "1600"}, Equivalent{"dms", "90"},
-                                           Equivalent{"deg", "90"}));
+                         ::testing::Values(Equivalent{"rad", "1.5707963267948966", 1.5707963267948966},
+                                           Equivalent{"grad", "100", 100.0}, Equivalent{"mil", "1600", 1600.0},
+                                           Equivalent{"dms", "90", 90.0}, Equivalent{"deg", "90", 90.0}));
 
 TEST(AngleConvert, RoundTripsThroughEveryUnit) {
   const char* units[] = {"rad", "grad", "mil", "dms"};

@@ -5,6 +5,7 @@
 #include <nlohmann/json.hpp>
 
 #include <cmath>
+#include <iterator>
 #include <sstream>
 #include <string>
 
