@@ -122,15 +122,6 @@ TEST(RowWriter, QuotedCsvTextReadsBack) {
   EXPECT_EQ(rows[1].fields[0], "a,b");
 }
 
-TEST(RowWriter, EmptyOutputIsWellFormed) {
-  std::ostringstream csv;
-  std::ostringstream json;
-  svy_tool::RowWriter(csv, {{"a", 1}}, {}).finish();
-  svy_tool::RowWriter(json, {{"a", 1}}, {true, false}).finish();
-  EXPECT_EQ(csv.str(), "a\n");
-  EXPECT_EQ(json.str(), "[]\n");
-}
-
 TEST(RowWriter, JsonRoundsLikeCsvUnlessFullPrecision) {
   std::ostringstream rounded;
   std::ostringstream full;

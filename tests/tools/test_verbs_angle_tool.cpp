@@ -51,12 +51,6 @@ TEST(AngleConvert, RoundTripsThroughEveryUnit) {
   }
 }
 
-TEST(AngleConvert, PackedSixtySecondsCarryIntoTheMinute) {
-  EXPECT_NEAR(convert("dms", "deg", "12.3030"), 12.508333333333333, 1e-12);
-  EXPECT_NEAR(convert("dms", "deg", "12.3060"), 12.516666666666667, 1e-12);
-  EXPECT_NEAR(convert("dms", "deg", "-12.3030"), -12.508333333333333, 1e-12);
-}
-
 TEST(AngleConvert, PackedOutputRoundsWholeSecondsWithoutReachingSixty) {
   // 12.9999999 degrees is 12 deg 59' 59.99964": at 4 decimals of seconds it stays below 13.
   const svy_test::SvyResult r = runSvy({"angle", "convert", "--from", "deg", "--to", "dms"}, "12.9999999\n13.0\n");
