@@ -42,7 +42,8 @@ constexpr std::array<std::array<int, 13>, 2> withYearLength() {
 }
 constexpr std::array<std::array<int, 13>, 2> kDaysBeforeMonthClosed = withYearLength();
 
-std::size_t isLeap(int year) { return year % 4 == 0 ? 1 : 0; }
+// Row of the tables for the year: 1 for a leap year (every year divisible by 4), else 0.
+std::size_t leapIndex(int year) { return year % 4 == 0 ? 1 : 0; }
 
 bool isMonth(int month) { return month >= 1 && month <= 12; }
 
@@ -100,7 +101,10 @@ void setUndefinedTime(int* year, int* hour, int* minute, double* second) {
 }  // namespace
 
 void mday_to_yday(int year, int month, int day, int* dayOfYear) {
-  *dayOfYear = isMonth(month) ? kDaysBeforeMonth[isLeap(year)][static_cast<std::size_t>(month - 1)] + day : 0;
+  // 64-bit sum: a day near the int limit gives 0 like a bad month instead of overflowing.
+  const std::int64_t sum =
+      isMonth(month) ? kDaysBeforeMonth[leapIndex(year)][static_cast<std::size_t>(month - 1)] + std::int64_t{day} : 0;
+  *dayOfYear = sum <= std::numeric_limits<int>::max() ? static_cast<int>(sum) : 0;
 }
 
 void ymdhms_to_gps(int year, int month, int day, int hour, int minute, double second, int* week,
@@ -110,7 +114,7 @@ void ymdhms_to_gps(int year, int month, int day, int hour, int minute, double se
     *secondsOfWeek = undefinedValue();
     return;
   }
-  const std::int64_t dayOfYear = static_cast<std::int64_t>(day) + kDaysBeforeMonth[isLeap(year)][static_cast<std::size_t>(month - 1)];
+  const std::int64_t dayOfYear = static_cast<std::int64_t>(day) + kDaysBeforeMonth[leapIndex(year)][static_cast<std::size_t>(month - 1)];
   mjdToGps(mjdOfDayOfYear(year, dayOfYear), hour, minute, second, week, secondsOfWeek);
 }
 
@@ -137,7 +141,7 @@ void gps_to_ymdhms(int week, double secondsOfWeek, int* year, int* month, int* d
     return;
   }
   // dayOfYear is 1..366 here, so the guess m0 is 0..11 and every index below is inside the table.
-  const auto& table = kDaysBeforeMonthClosed[isLeap(*year)];
+  const auto& table = kDaysBeforeMonthClosed[leapIndex(*year)];
   const int m0 = static_cast<int>(std::trunc(dayOfYear * kMonthGuessPerDay));
   const int k = dayOfYear > table[static_cast<std::size_t>(m0 + 1)] ? 1 : 0;
   *month = m0 + 1 + k;

@@ -9,7 +9,7 @@
 //
 // Dates and times are not validated: a day 0 or 32, an hour of 25 or a year outside the valid range gives a
 // meaningless result. Only inputs that would leave the arithmetic undefined are refused: a month outside
-// 1..12 gives NaN seconds of week (and day of year 0); a GPS time that is not finite or falls before 1901
+// 1..12 gives NaN seconds of week (and day of year 0, as does a day beyond the int range); a GPS time that is not finite or falls before 1901
 // gives zero calendar fields and NaN seconds; a week number beyond 32 bits gives week 0 and NaN seconds.
 // Before the epoch the week is truncated toward zero, so the seconds of week are negative there.
 #include "svymath/foundation/export.h"

@@ -165,6 +165,9 @@ TEST(GpsTimeCalendar, InputsThatNameNoDayGiveUndefinedResults) {
     mday_to_yday(2020, month, 1, &dayOfYear);
     EXPECT_EQ(dayOfYear, 0);
   }
+  int dayOfYear = -1;
+  mday_to_yday(2020, 12, INT_MAX, &dayOfYear);
+  EXPECT_EQ(dayOfYear, 0);
   for (int year : {INT_MAX, INT_MIN}) {
     ymdhms_to_gps(year, 12, 31, 23, 59, 59.0, &week, &secondsOfWeek);
     EXPECT_TRUE(std::isnan(secondsOfWeek)) << year;
