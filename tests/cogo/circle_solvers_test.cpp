@@ -25,113 +25,74 @@ C2dPos along(const C2dPos& from, const C2dPos& to, double t) {
   return C2dPos(from.north() + t * (to.north() - from.north()), from.east() + t * (to.east() - from.east()));
 }
 
-// Distance from p to the infinite line through a and b.
-double distToLine(const C2dPos& p, const C2dPos& a, const C2dPos& b) {
-  const double dN = b.north() - a.north();
-  const double dE = b.east() - a.east();
-  return std::fabs(dN * (p.east() - a.east()) - dE * (p.north() - a.north())) / std::hypot(dN, dE);
-}
-
-#define EXPECT_POS_NEAR(actual, expected, tol) EXPECT_NEAR(dist((actual), (expected)), 0.0, (tol))
-
 const C2dPos kOrigin(0.0, 0.0);
-const C2dPos kGrid(5000000.0, 500000.0);      // N 5 000 000, E 500 000
+const C2dPos kGrid(5000000.0, 500000.0);         // N 5 000 000, E 500 000
 const C2dPos kSouthGrid(9876543.21, 712345.67);  // near the southern false northing
 
-// ---------------------------------------------------------------------------------------------------
-// Line and circle: a chord through two chosen points of the circle, the line given by two other points
-// on it. The solver must find exactly the chosen points, the one met first from the first line point
-// first.
-
-struct ChordCase {
-  C2dPos center;
-  double radius;
-  double az1, az2;  // azimuths (degrees) of the chord ends seen from the centre
-  double t1, t2;    // the line points, as parameters along end1 -> end2
-};
-
-class LineCircleChord : public ::testing::TestWithParam<ChordCase> {};
-
-TEST_P(LineCircleChord, FindsBothChordEndsInTravelOrder) {
-  const ChordCase& c = GetParam();
-  const C2dPos end1 = onCircle(c.center, c.radius, c.az1);
-  const C2dPos end2 = onCircle(c.center, c.radius, c.az2);
-  const C2dPos line1 = along(end1, end2, c.t1);
-  const C2dPos line2 = along(end1, end2, c.t2);
-  C2dPos s1, s2;
-  ASSERT_EQ(IntersectionCoordsOfLineAndCircle(line1, line2, c.center, c.radius, s1, s2), 2);
-  // The input positions carry rounding of up to 1e-9 m at grid coordinates; along the line that moves a
-  // crossing by the rounding over the sine of the angle at which line and circle cross (half the
-  // central angle of the chord).
-  const double crossingSine = std::fabs(std::sin((c.az2 - c.az1) * kDegToRad / 2));
-  const double tol = 1e-9 * (1.0 + 2.0 / crossingSine);
-  const bool forward = c.t2 > c.t1;
-  EXPECT_POS_NEAR(s1, forward ? end1 : end2, tol);
-  EXPECT_POS_NEAR(s2, forward ? end2 : end1, tol);
-  // And independently of the construction: on both shapes.
-  for (const C2dPos& s : {s1, s2}) {
-    EXPECT_NEAR(dist(s, c.center), c.radius, 1e-8);
-    EXPECT_NEAR(distToLine(s, line1, line2), 0.0, 1e-8);
+// A chord through two chosen points of the circle, the line given by two other points on it: the solver
+// finds exactly the chosen points, the one met first from the first line point first.
+TEST(LineCircle, FindsBothChordEndsInTravelOrder) {
+  struct {
+    C2dPos center;
+    double radius, az1, az2;  // azimuths (degrees) of the chord ends seen from the centre
+    double t1, t2;            // the line points, as parameters along end1 -> end2
+  } const cases[] = {{kOrigin, 10.0, 30.0, 150.0, 0.25, 0.75},  // line points inside the circle
+                     {kOrigin, 10.0, 30.0, 150.0, 2.0, -0.5},   // travelling the other way
+                     {kOrigin, 5.0, 10.0, -10.0, 0.0, 1.0},     // constant northing
+                     {kOrigin, 5.0, 89.99, 90.01, 0.0, 1.0},    // nearly constant easting
+                     {kOrigin, 5.0, 45.0, 225.0, -1.0, 3.0},    // diameter
+                     {kGrid, 250.0, 100.0, 280.0, 1.0, -3.0},   // grid coordinates
+                     {kGrid, 1000.0, 300.0, 300.5, -2.0, 7.0},  // short chord of a large circle
+                     {kSouthGrid, 3000.0, 135.0, 315.0, 4.0, 2.0}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(::testing::Message() << c.radius << " " << c.az1 << " " << c.az2 << " " << c.t1);
+    const C2dPos end1 = onCircle(c.center, c.radius, c.az1), end2 = onCircle(c.center, c.radius, c.az2);
+    const C2dPos line1 = along(end1, end2, c.t1), line2 = along(end1, end2, c.t2);
+    C2dPos s1, s2;
+    ASSERT_EQ(IntersectionCoordsOfLineAndCircle(line1, line2, c.center, c.radius, s1, s2), 2);
+    // Input rounding (1e-9 m at grid coordinates) moves a crossing by that over the sine of the angle at
+    // which line and circle cross (half the central angle of the chord).
+    const double tol = 1e-9 * (1.0 + 2.0 / std::fabs(std::sin((c.az2 - c.az1) * kDegToRad / 2)));
+    const bool forward = c.t2 > c.t1;
+    EXPECT_NEAR(dist(s1, forward ? end1 : end2), 0.0, tol);
+    EXPECT_NEAR(dist(s2, forward ? end2 : end1), 0.0, tol);
+    for (const C2dPos& s : {s1, s2}) EXPECT_NEAR(dist(s, c.center), c.radius, 1e-8);
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Chords, LineCircleChord,
-    ::testing::Values(
-        ChordCase{kOrigin, 10.0, 30.0, 150.0, -0.5, 2.0},       // general
-        ChordCase{kOrigin, 10.0, 30.0, 150.0, 0.25, 0.75},      // line points inside the circle
-        ChordCase{kOrigin, 10.0, 30.0, 150.0, 2.0, -0.5},       // travelling the other way
-        ChordCase{kOrigin, 5.0, 10.0, -10.0, 0.0, 1.0},         // constant northing
-        ChordCase{kOrigin, 5.0, 80.0, 100.0, 0.0, 1.0},         // constant easting
-        ChordCase{kOrigin, 5.0, 89.99, 90.01, 0.0, 1.0},        // nearly constant easting, short chord
-        ChordCase{kOrigin, 5.0, 45.0, 225.0, -1.0, 3.0},        // diameter
-        ChordCase{kGrid, 250.0, 12.3, 199.9, 0.1, 5.0},         // grid coordinates, all quadrants
-        ChordCase{kGrid, 250.0, 100.0, 280.0, 1.0, -3.0},
-        ChordCase{kGrid, 1000.0, 300.0, 300.5, -2.0, 7.0},      // short chord of a large circle
-        ChordCase{kGrid, 0.5, 170.0, 350.0, 0.0, 1.0},
-        ChordCase{kSouthGrid, 3000.0, 2.0, 358.0, 0.0, 1.0},
-        ChordCase{kSouthGrid, 3000.0, 135.0, 315.0, 4.0, 2.0}));
-
 // A line tangent to the circle at a chosen point, given by two points away from it, touches once.
-class LineCircleTangent : public ::testing::TestWithParam<std::tuple<C2dPos, double, double>> {};
-
-TEST_P(LineCircleTangent, TouchesOnceAtTheTangentPoint) {
-  const C2dPos center = std::get<0>(GetParam());
-  const double radius = std::get<1>(GetParam());
-  const double azimuthDeg = std::get<2>(GetParam());
-  const C2dPos touch = onCircle(center, radius, azimuthDeg);
-  // The tangent direction is the radial direction turned by 90 degrees.
-  const double a = azimuthDeg * kDegToRad;
-  const C2dPos line1(touch.north() + 30.0 * std::sin(a), touch.east() - 30.0 * std::cos(a));
-  const C2dPos line2(touch.north() - 55.0 * std::sin(a), touch.east() + 55.0 * std::cos(a));
-  C2dPos s1, s2;
-  ASSERT_EQ(IntersectionCoordsOfLineAndCircle(line1, line2, center, radius, s1, s2), 1);
-  // The touching point is the foot of the centre on the line: rounding of the line points (85 m apart)
-  // turns the line by about 1e-9 / 85 rad, which moves the foot by the radius times that.
-  EXPECT_POS_NEAR(s1, touch, 1e-8 + radius * 2e-11);
-  EXPECT_EQ(s1, s2);
+TEST(LineCircle, TangentTouchesOnceAtTheTangentPoint) {
+  for (const C2dPos& center : {kOrigin, kGrid, kSouthGrid}) {
+    for (double radius : {1.0, 2500.0}) {
+      for (double azimuthDeg : {0.0, 143.0, 270.0, 333.3}) {
+        SCOPED_TRACE(::testing::Message() << center.north() << " " << radius << " " << azimuthDeg);
+        const C2dPos touch = onCircle(center, radius, azimuthDeg);
+        const double a = azimuthDeg * kDegToRad;
+        const C2dPos line1(touch.north() + 30.0 * std::sin(a), touch.east() - 30.0 * std::cos(a));
+        const C2dPos line2(touch.north() - 55.0 * std::sin(a), touch.east() + 55.0 * std::cos(a));
+        C2dPos s1, s2;
+        ASSERT_EQ(IntersectionCoordsOfLineAndCircle(line1, line2, center, radius, s1, s2), 1);
+        // Rounding of the line points (85 m apart) turns the line by about 1e-9 / 85 rad.
+        EXPECT_NEAR(dist(s1, touch), 0.0, 1e-8 + radius * 2e-11);
+        EXPECT_EQ(s1, s2);
+      }
+    }
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(Tangents, LineCircleTangent,
-                         ::testing::Combine(::testing::Values(kOrigin, kGrid, kSouthGrid),
-                                            ::testing::Values(1.0, 120.0, 2500.0),
-                                            ::testing::Values(0.0, 37.0, 90.0, 143.0, 180.0, 251.0,
-                                                              270.0, 333.3)));
 
 TEST(LineCircle, MissesBeyondTheToleranceAndCrossesJustInside) {
   // Lines of constant northing at a distance from the centre just above and below the radius.
   const double radius = 100.0;
   C2dPos s1(-1, -1), s2(-2, -2);
-  const double outside = kGrid.north() + radius + 1e-6;
-  EXPECT_EQ(IntersectionCoordsOfLineAndCircle(C2dPos(outside, kGrid.east() - 10), C2dPos(outside, kGrid.east() + 10),
-                                              kGrid, radius, s1, s2),
-            0);
+  auto solve = [&](double north, double e1, double e2) {
+    return IntersectionCoordsOfLineAndCircle(C2dPos(north, kGrid.east() + e1), C2dPos(north, kGrid.east() + e2),
+                                             kGrid, radius, s1, s2);
+  };
+  EXPECT_EQ(solve(kGrid.north() + radius + 1e-6, -10, 10), 0);
   EXPECT_EQ(s1, C2dPos(-1, -1));
   EXPECT_EQ(s2, C2dPos(-2, -2));
   const double inside = kGrid.north() + radius - 1e-6;
-  ASSERT_EQ(IntersectionCoordsOfLineAndCircle(C2dPos(inside, kGrid.east() - 10), C2dPos(inside, kGrid.east() + 10),
-                                              kGrid, radius, s1, s2),
-            2);
+  ASSERT_EQ(solve(inside, -10, 10), 2);
   // Half chord sqrt(2 R delta - delta^2) = 0.01414 m, westward first; delta as stored (exact difference).
   const double delta = (kGrid.north() + radius) - inside;
   const double halfChord = std::sqrt(2.0 * radius * delta - delta * delta);
@@ -139,140 +100,105 @@ TEST(LineCircle, MissesBeyondTheToleranceAndCrossesJustInside) {
   EXPECT_NEAR(s2.east() - kGrid.east(), halfChord, 1e-9);
   // A chord shorter than 2 sqrt(2 R 1e-8) (2.8 mm here) is within the tangency tolerance: one point.
   const double touching = kGrid.north() + radius - 0.5e-8;
-  ASSERT_EQ(IntersectionCoordsOfLineAndCircle(C2dPos(touching, kGrid.east() + 10), C2dPos(touching, kGrid.east() - 10),
-                                              kGrid, radius, s1, s2),
-            1);
+  ASSERT_EQ(solve(touching, 10, -10), 1);
   EXPECT_NEAR(s1.north(), touching, 1e-9);
   EXPECT_NEAR(s1.east(), kGrid.east(), 1e-9);
 }
 
 TEST(LineCircle, InputThatDefinesNoLineOrCircleGivesNoSolution) {
   C2dPos s1(-1, -1), s2(-2, -2);
-  const C2dPos a(1.0, 2.0), b(3.0, 5.0);
-  EXPECT_EQ(IntersectionCoordsOfLineAndCircle(a, a, kOrigin, 10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfLineAndCircle(a, b, kOrigin, 0.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfLineAndCircle(a, b, kOrigin, -10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfLineAndCircle(a, b, kOrigin, kNaN, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfLineAndCircle(a, b, C2dPos(kNaN, 0.0), 10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfLineAndCircle(C2dPos(kNaN, 0.0), b, kOrigin, 10.0, s1, s2), 0);
-  // Differences that overflow.
-  EXPECT_EQ(IntersectionCoordsOfLineAndCircle(C2dPos(1e308, 0.0), C2dPos(1e308, 1.0), C2dPos(-1e308, 0.0), 1.0, s1, s2), 0);
+  const C2dPos a(1.0, 2.0), b(3.0, 5.0), n(kNaN, 0.0), far(1e308, 0.0);
+  struct {
+    C2dPos p, q, center;
+    double radius;
+  } const cases[] = {{a, a, kOrigin, 10.0}, {a, b, kOrigin, 0.0},  {a, b, kOrigin, -10.0},
+                     {a, b, kOrigin, kNaN}, {a, b, n, 10.0},       {n, b, kOrigin, 10.0},
+                     {far, C2dPos(1e308, 1.0), C2dPos(-1e308, 0.0), 1.0}};  // differences that overflow
+  for (const auto& c : cases) EXPECT_EQ(IntersectionCoordsOfLineAndCircle(c.p, c.q, c.center, c.radius, s1, s2), 0);
   EXPECT_EQ(s1, C2dPos(-1, -1));
   EXPECT_EQ(s2, C2dPos(-2, -2));
 }
 
-// ---------------------------------------------------------------------------------------------------
-// Two circles: circles through two chosen points, centred on either side of (or on) their
-// perpendicular bisector. The solver must return the chosen points, the one right of
-// centre1 -> centre2 first.
-
-struct TwoCircleCase {
-  C2dPos p, q;       // the crossings
-  double off1, off2;  // signed distances of the centres from the chord middle along its right normal
-};
-
-class TwoCirclesThroughTwoPoints : public ::testing::TestWithParam<TwoCircleCase> {};
-
-TEST_P(TwoCirclesThroughTwoPoints, FindsBothPointsRightOfTheCentreLineFirst) {
-  const TwoCircleCase& c = GetParam();
-  const C2dPos middle = along(c.p, c.q, 0.5);
-  const double chord = dist(c.p, c.q);
-  // Right normal of the chord direction p -> q.
-  const double nN = -(c.q.east() - c.p.east()) / chord;
-  const double nE = (c.q.north() - c.p.north()) / chord;
-  const C2dPos center1(middle.north() + c.off1 * nN, middle.east() + c.off1 * nE);
-  const C2dPos center2(middle.north() + c.off2 * nN, middle.east() + c.off2 * nE);
-  const double r1 = std::hypot(chord / 2, c.off1);
-  const double r2 = std::hypot(chord / 2, c.off2);
-  C2dPos s1, s2;
-  ASSERT_EQ(IntersectionCoordsOfTwoCircles(center1, r1, center2, r2, s1, s2), 2);
-  // Travelling along the chord's right normal (centre2 further along it than centre1), p lies on the right.
-  const bool pOnRight = c.off2 > c.off1;
-  // Rounding of the inputs (up to 1e-9 m at grid coordinates) moves a crossing by that over the sine of
-  // the angle at which the circles cross.
-  const double crossingSine = std::fabs(c.off2 - c.off1) * (chord / 2) / (r1 * r2);
-  const double tol = 1e-9 * (1.0 + 4.0 / crossingSine);
-  EXPECT_POS_NEAR(s1, pOnRight ? c.p : c.q, tol);
-  EXPECT_POS_NEAR(s2, pOnRight ? c.q : c.p, tol);
-  for (const C2dPos& s : {s1, s2}) {
-    EXPECT_NEAR(dist(s, center1), r1, 1e-8);
-    EXPECT_NEAR(dist(s, center2), r2, 1e-8);
+// Circles through two chosen points, centred on either side of (or on) their perpendicular bisector: the
+// solver returns the chosen points, the one right of centre1 -> centre2 first.
+TEST(TwoCircles, FindsBothPointsRightOfTheCentreLineFirst) {
+  struct {
+    C2dPos p, q;        // the crossings
+    double off1, off2;  // signed distances of the centres from the chord middle along its right normal
+  } const cases[] = {{C2dPos(0, -3), C2dPos(0, 3), 4.0, -4.0},
+                     {C2dPos(0, -3), C2dPos(0, 3), 1.0, 9.0},   // centres on one side
+                     {C2dPos(0, -3), C2dPos(0, 3), 0.0, 50.0},  // chord is a diameter
+                     {C2dPos(5000010.0, 500020.0), C2dPos(4999970.0, 499990.0), -120.0, 35.0},
+                     {C2dPos(5000010.0, 500020.0), C2dPos(5000010.5, 500020.25), -800.0, 600.0},
+                     {kSouthGrid, C2dPos(9876000.0, 712000.0), 3000.0, -10.0}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(::testing::Message() << c.p.north() << " " << c.off1 << " " << c.off2);
+    const C2dPos middle = along(c.p, c.q, 0.5);
+    const double chord = dist(c.p, c.q);
+    const double nN = -(c.q.east() - c.p.east()) / chord, nE = (c.q.north() - c.p.north()) / chord;
+    const C2dPos center1(middle.north() + c.off1 * nN, middle.east() + c.off1 * nE);
+    const C2dPos center2(middle.north() + c.off2 * nN, middle.east() + c.off2 * nE);
+    const double r1 = std::hypot(chord / 2, c.off1), r2 = std::hypot(chord / 2, c.off2);
+    C2dPos s1, s2;
+    ASSERT_EQ(IntersectionCoordsOfTwoCircles(center1, r1, center2, r2, s1, s2), 2);
+    const bool pOnRight = c.off2 > c.off1;
+    // Input rounding moves a crossing by that over the sine of the angle at which the circles cross.
+    const double tol = 1e-9 * (1.0 + 4.0 * r1 * r2 / (std::fabs(c.off2 - c.off1) * (chord / 2)));
+    EXPECT_NEAR(dist(s1, pOnRight ? c.p : c.q), 0.0, tol);
+    EXPECT_NEAR(dist(s2, pOnRight ? c.q : c.p), 0.0, tol);
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Crossings, TwoCirclesThroughTwoPoints,
-    ::testing::Values(TwoCircleCase{C2dPos(0, -3), C2dPos(0, 3), -4.0, 4.0},
-                      TwoCircleCase{C2dPos(0, -3), C2dPos(0, 3), 4.0, -4.0},
-                      TwoCircleCase{C2dPos(0, -3), C2dPos(0, 3), 1.0, 9.0},   // centres on one side
-                      TwoCircleCase{C2dPos(0, -3), C2dPos(0, 3), 0.0, 50.0},  // chord is a diameter
-                      TwoCircleCase{C2dPos(5000010.0, 500020.0), C2dPos(4999970.0, 499990.0), -120.0, 35.0},
-                      TwoCircleCase{C2dPos(5000010.0, 500020.0), C2dPos(5000010.5, 500020.25), -800.0, 600.0},
-                      TwoCircleCase{C2dPos(9876543.21, 712345.67), C2dPos(9876000.0, 712000.0), 3000.0, -10.0}));
-
-struct TangentCirclesCase {
-  C2dPos center1;
-  double r1, r2;
-  double azimuthDeg;  // direction centre1 -> centre2
-  bool internal;
-};
-
-class TangentCircles : public ::testing::TestWithParam<TangentCirclesCase> {};
-
-TEST_P(TangentCircles, TouchOnceOnTheCentreLine) {
-  const TangentCirclesCase& c = GetParam();
-  const double d = c.internal ? std::fabs(c.r1 - c.r2) : c.r1 + c.r2;
-  const C2dPos center2 = onCircle(c.center1, d, c.azimuthDeg);
-  // Externally the touching point is r1 toward centre2; internally r1 toward or away from it.
-  const double toward = (c.internal && c.r2 > c.r1) ? -c.r1 : c.r1;
-  const C2dPos touch = onCircle(c.center1, toward, c.azimuthDeg);
-  C2dPos s1, s2;
-  ASSERT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, center2, c.r2, s1, s2), 1);
-  // The touching point lies along the centre line, whose direction the rounding of the centres (1e-9 m)
-  // turns by 2e-9 / d rad.
-  EXPECT_POS_NEAR(s1, touch, 1e-8 + c.r1 * 2e-9 / d);
-  EXPECT_EQ(s1, s2);
-  // Pulled apart (or pushed inside) by a micrometre they no longer meet; pushed the other way, they cross.
-  const C2dPos apart = onCircle(c.center1, c.internal ? d - 1e-6 : d + 1e-6, c.azimuthDeg);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, apart, c.r2, s1, s2), 0);
-  const C2dPos overlapping = onCircle(c.center1, c.internal ? d + 1e-6 : d - 1e-6, c.azimuthDeg);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, overlapping, c.r2, s1, s2), 2);
+// Tangent circles touch once on the centre line; a micrometre apart (or further inside) they do not meet,
+// a micrometre the other way they cross.
+TEST(TwoCircles, TangentCirclesTouchOnceOnTheCentreLine) {
+  struct {
+    C2dPos center1;
+    double r1, r2, azimuthDeg;  // direction centre1 -> centre2
+    bool internal;
+  } const cases[] = {{kOrigin, 3.0, 4.0, 123.0, false},   {kGrid, 250.0, 40.0, 211.0, false},
+                     {kGrid, 250.0, 40.0, 300.0, true},   {kGrid, 40.0, 250.0, 45.0, true},
+                     {kSouthGrid, 1500.0, 1499.0, 95.0, true}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(::testing::Message() << c.r1 << " " << c.r2 << " " << c.azimuthDeg);
+    const double d = c.internal ? std::fabs(c.r1 - c.r2) : c.r1 + c.r2;
+    const double toward = (c.internal && c.r2 > c.r1) ? -c.r1 : c.r1;
+    C2dPos s1, s2;
+    ASSERT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, onCircle(c.center1, d, c.azimuthDeg), c.r2, s1, s2), 1);
+    // Rounding of the centres (1e-9 m) turns the centre line by 2e-9 / d rad.
+    EXPECT_NEAR(dist(s1, onCircle(c.center1, toward, c.azimuthDeg)), 0.0, 1e-8 + c.r1 * 2e-9 / d);
+    EXPECT_EQ(s1, s2);
+    const double step = c.internal ? -1e-6 : 1e-6;
+    EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, onCircle(c.center1, d + step, c.azimuthDeg), c.r2, s1, s2), 0);
+    EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, onCircle(c.center1, d - step, c.azimuthDeg), c.r2, s1, s2), 2);
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Tangencies, TangentCircles,
-    ::testing::Values(TangentCirclesCase{kOrigin, 3.0, 4.0, 0.0, false},
-                      TangentCirclesCase{kOrigin, 3.0, 4.0, 123.0, false},
-                      TangentCirclesCase{kGrid, 250.0, 40.0, 211.0, false},
-                      TangentCirclesCase{kGrid, 250.0, 40.0, 300.0, true},
-                      TangentCirclesCase{kGrid, 40.0, 250.0, 45.0, true},
-                      TangentCirclesCase{kSouthGrid, 1500.0, 1499.0, 95.0, true}));
 
 TEST(TwoCircles, DisjointNestedConcentricAndInvalidGiveNoSolution) {
   C2dPos s1(-1, -1), s2(-2, -2);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(kGrid, 10.0, C2dPos(kGrid.north() + 30.0, kGrid.east()), 10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(kGrid, 50.0, C2dPos(kGrid.north() + 3.0, kGrid.east()), 10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(kGrid, 50.0, kGrid, 50.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(kGrid, 50.0, kGrid, 20.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(kGrid, 50.0, C2dPos(kGrid.north() + 1e-9, kGrid.east()), 50.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(kGrid, 0.0, kOrigin, 10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(kGrid, 10.0, kOrigin, -10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(kGrid, kNaN, kOrigin, 10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(C2dPos(0.0, kNaN), 10.0, kOrigin, 10.0, s1, s2), 0);
-  EXPECT_EQ(IntersectionCoordsOfTwoCircles(C2dPos(-1e308, 0.0), 1e308, C2dPos(1e308, 0.0), 1e308, s1, s2), 0);
+  const C2dPos north30(kGrid.north() + 30.0, kGrid.east()), north3(kGrid.north() + 3.0, kGrid.east());
+  struct {
+    C2dPos c1;
+    double r1;
+    C2dPos c2;
+    double r2;
+  } const cases[] = {{kGrid, 10.0, north30, 10.0},  {kGrid, 50.0, north3, 10.0},      {kGrid, 50.0, kGrid, 50.0},
+                     {kGrid, 50.0, kGrid, 20.0},    {kGrid, 50.0, C2dPos(kGrid.north() + 1e-9, kGrid.east()), 50.0},
+                     {kGrid, 0.0, kOrigin, 10.0},   {kGrid, 10.0, kOrigin, -10.0},    {kGrid, kNaN, kOrigin, 10.0},
+                     {C2dPos(0.0, kNaN), 10.0, kOrigin, 10.0},
+                     {C2dPos(-1e308, 0.0), 1e308, C2dPos(1e308, 0.0), 1e308}};
+  for (const auto& c : cases) EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.c1, c.r1, c.c2, c.r2, s1, s2), 0);
   EXPECT_EQ(s1, C2dPos(-1, -1));
   EXPECT_EQ(s2, C2dPos(-2, -2));
 }
 
-TEST(TwoCircles, NearlyConcentricTouchingCirclesTouchOnTheSmallerOnesFarSide) {
+TEST(TwoCircles, NearlyConcentricCircles) {
   // Centres 2e-8 apart, radii differing by 2.5e-8: touching within the tolerance. The point must lie on
-  // both circles (the chord formula would put it 2.5 m off here).
-  const double d = 2e-8;
-  const C2dPos center2(kOrigin.north(), kOrigin.east() + d);
+  // both circles (the chord formula would put it 2.5 m off here), on the smaller one's far side.
+  const C2dPos center2(0.0, 2e-8);
   for (const bool firstLarger : {true, false}) {
     SCOPED_TRACE(firstLarger);
-    const double r1 = firstLarger ? 10.0 : 10.0 - 2.5e-8;
-    const double r2 = firstLarger ? 10.0 - 2.5e-8 : 10.0;
+    const double r1 = firstLarger ? 10.0 : 10.0 - 2.5e-8, r2 = firstLarger ? 10.0 - 2.5e-8 : 10.0;
     C2dPos s1, s2;
     ASSERT_EQ(IntersectionCoordsOfTwoCircles(kOrigin, r1, center2, r2, s1, s2), 1);
     EXPECT_NEAR(dist(s1, kOrigin), r1, 1e-8);
@@ -280,15 +206,11 @@ TEST(TwoCircles, NearlyConcentricTouchingCirclesTouchOnTheSmallerOnesFarSide) {
     EXPECT_NEAR(s1.north(), 0.0, 1e-12);
     EXPECT_GT(s1.east() * (firstLarger ? 1.0 : -1.0), 0.0);
   }
-}
-
-TEST(TwoCircles, EqualCirclesALittleApartCrossFarFromTheCentreLine) {
-  // Nearly concentric but distinct: the crossings are almost a diameter apart, across the centre line.
+  // Equal circles a little apart cross almost a diameter apart, across the centre line.
   C2dPos s1, s2;
-  const C2dPos center2(kOrigin.north() + 1e-6, kOrigin.east());
-  ASSERT_EQ(IntersectionCoordsOfTwoCircles(kOrigin, 10.0, center2, 10.0, s1, s2), 2);
-  EXPECT_POS_NEAR(s1, C2dPos(0.5e-6, std::sqrt(100.0 - 0.25e-12)), 1e-12);
-  EXPECT_POS_NEAR(s2, C2dPos(0.5e-6, -std::sqrt(100.0 - 0.25e-12)), 1e-12);
+  ASSERT_EQ(IntersectionCoordsOfTwoCircles(kOrigin, 10.0, C2dPos(1e-6, 0.0), 10.0, s1, s2), 2);
+  EXPECT_NEAR(dist(s1, C2dPos(0.5e-6, std::sqrt(100.0 - 0.25e-12))), 0.0, 1e-12);
+  EXPECT_NEAR(dist(s2, C2dPos(0.5e-6, -std::sqrt(100.0 - 0.25e-12))), 0.0, 1e-12);
 }
 
 }  // namespace

@@ -10,97 +10,70 @@ namespace {
 
 using svy_text::CSvyString;
 
-struct TWriteCase {
-  CSvyString (*write)(double, int);
-  double degrees;
-  int decimals;
-  const wchar_t* text;
-};
-
-class AngleTextWriting : public ::testing::TestWithParam<TWriteCase> {};
-
-TEST_P(AngleTextWriting, PadsFieldsAndCarriesTheSignInFront) {
-  const TWriteCase& c = GetParam();
-  EXPECT_EQ(c.write(c.degrees, c.decimals).str(), c.text);
-}
-
 constexpr double kDms = 45.0 + 30.0 / 60 + 15.25 / 3600;
 
-INSTANTIATE_TEST_SUITE_P(
-    Cases, AngleTextWriting,
-    ::testing::Values(TWriteCase{svy_formats::DMSToString, kDms, 2, L"45\u00B030'15.25\""},
-                      TWriteCase{svy_formats::DMSToString, kDms, 0, L"45\u00B030'15\""},
-                      TWriteCase{svy_formats::DMSToString, -0.5, 0,
-                                 L"-0\u00B030'00\""},  // the sign survives below 1 degree
-                      TWriteCase{svy_formats::DMSToString, 12.0 + 5.0 / 60 + 5.5 / 3600, 1,
-                                 L"12\u00B005'05.5\""},
-                      TWriteCase{svy_formats::DMSToString, 359.99999999, 2,
-                                 L"360\u00B000'00.00\""},  // carried, not reduced
-                      TWriteCase{svy_formats::DMSToString, -0.00000001, 2,
-                                 L"0\u00B000'00.00\""},  // rounds to an unsigned zero
-                      TWriteCase{svy_formats::DMSToString, 1.0, -3, L"1\u00B000'00\""},
-                      TWriteCase{svy_formats::DMMToString, 45.5042, 3, L"45\u00B030.252'"},
-                      TWriteCase{svy_formats::DMMToString, -12.0 + -5.5 / 60, 1, L"-12\u00B005.5'"},
-                      TWriteCase{svy_formats::DMMToString, 10.99999, 2, L"11\u00B000.00'"},
-                      TWriteCase{svy_formats::DegreeToString, 45.50424, 3, L"45.504\u00B0"},
-                      TWriteCase{svy_formats::DegreeToString, -2.675, 2, L"-2.68\u00B0"}));
-
-TEST(AngleTextWriting, NonFiniteAnglesGiveEmptyText) {
+// Fields are padded and the sign goes in front.
+TEST(AngleTextWriting, PadsFieldsCarriesAndSigns) {
+  using svy_formats::DegreeToString;
+  using svy_formats::DMMToString;
+  using svy_formats::DMSToString;
+  struct {
+    CSvyString (*write)(double, int);
+    double degrees;
+    int decimals;
+    const wchar_t* text;
+  } const cases[] = {
+      {DMSToString, kDms, 2, L"45\u00B030'15.25\""},     {DMSToString, kDms, 0, L"45\u00B030'15\""},
+      {DMSToString, -0.5, 0, L"-0\u00B030'00\""},        // the sign survives below 1 degree
+      {DMSToString, 359.99999999, 2, L"360\u00B000'00.00\""},  // carried, not reduced
+      {DMSToString, -0.00000001, 2, L"0\u00B000'00.00\""},     // rounds to an unsigned zero
+      {DMSToString, 1.0, -3, L"1\u00B000'00\""},         {DMMToString, 45.5042, 3, L"45\u00B030.252'"},
+      {DMMToString, -12.0 + -5.5 / 60, 1, L"-12\u00B005.5'"}, {DMMToString, 10.99999, 2, L"11\u00B000.00'"},
+      {DegreeToString, 45.50424, 3, L"45.504\u00B0"},     {DegreeToString, -2.675, 2, L"-2.68\u00B0"}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(::testing::Message() << c.degrees << " decimals " << c.decimals);
+    EXPECT_EQ(c.write(c.degrees, c.decimals).str(), c.text);
+  }
   const double nan = std::numeric_limits<double>::quiet_NaN();
-  EXPECT_TRUE(svy_formats::DMSToString(nan, 2).IsEmpty());
-  EXPECT_TRUE(svy_formats::DMSToString(1e300, 2).IsEmpty());
-  EXPECT_TRUE(svy_formats::DMMToString(-std::numeric_limits<double>::infinity(), 2).IsEmpty());
-  EXPECT_TRUE(svy_formats::DegreeToString(nan, 2).IsEmpty());
+  EXPECT_TRUE(DMSToString(nan, 2).IsEmpty());
+  EXPECT_TRUE(DMSToString(1e300, 2).IsEmpty());
+  EXPECT_TRUE(DMMToString(-std::numeric_limits<double>::infinity(), 2).IsEmpty());
+  EXPECT_TRUE(DegreeToString(nan, 2).IsEmpty());
 }
 
-struct TReadCase {
-  const wchar_t* text;
-  bool dms;
-  bool dmm;
-  bool degree;
-  double degrees;
-};
-
-class AngleTextReading : public ::testing::TestWithParam<TReadCase> {};
-
-TEST_P(AngleTextReading, AcceptsTypedFormsAndLeavesFailuresAlone) {
-  const TReadCase& c = GetParam();
-  const CSvyString text(c.text);
-  constexpr double kUntouched = -777.0;
-  double dms = kUntouched;
-  double dmm = kUntouched;
-  double degree = kUntouched;
-  EXPECT_EQ(svy_formats::ParseDMS(text, dms), c.dms);
-  EXPECT_EQ(svy_formats::ParseDMM(text, dmm), c.dmm);
-  EXPECT_EQ(svy_formats::ParseDegree(text, degree), c.degree);
-  EXPECT_EQ(svy_formats::is_str_dmm(text), c.dmm);
-  EXPECT_EQ(svy_formats::is_str_degree(text), c.degree);
-  EXPECT_NEAR(dms, c.dms ? c.degrees : kUntouched, 1e-12);
-  EXPECT_NEAR(dmm, c.dmm ? c.degrees : kUntouched, 1e-12);
-  EXPECT_NEAR(degree, c.degree ? c.degrees : kUntouched, 1e-12);
+// Each reader accepts its typed forms and leaves the value alone when it fails.
+TEST(AngleTextReading, AcceptsTypedFormsAndLeavesFailuresAlone) {
+  struct {
+    const wchar_t* text;
+    bool dms, dmm, degree;
+    double degrees;
+  } const cases[] = {
+      {L"45\u00B030'15.25\"", true, false, false, kDms}, {L"45:30:15,25", true, false, false, kDms},
+      {L"45d30m15.25s", true, false, false, kDms},        {L" 45\u00B0 30\u2032 15.25\u2033 ", true, false, false, kDms},
+      {L"-12\u00B005'", true, true, false, -(12.0 + 5.0 / 60)}, {L"+12 5.5", true, true, false, 12.0 + 5.5 / 60},
+      {L"45,5", true, true, true, 45.5},  {L".5", true, true, true, 0.5},  {L"45.", true, true, true, 45.0},
+      // Rejected forms.
+      {L"45.5\u00B030'", false, false, false, 0},  // decimals before the last field
+      {L"45 30 60", false, false, false, 0},
+      {L"45'", false, false, false, 0},  // a minute mark on the degrees
+      {L"45\u00B030\u00B0", false, false, false, 0}, {L"45 30 15 5", false, false, false, 0},
+      {L"45.30.15", false, false, false, 0}, {L"1e3", false, false, false, 0}, {L"- 45", false, false, false, 0},
+      {L"-", false, false, false, 0}, {L"", false, false, false, 0}, {L"N45E", false, false, false, 0}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(CSvyString(c.text).ToNarrow());
+    const CSvyString text(c.text);
+    constexpr double kUntouched = -777.0;
+    double dms = kUntouched, dmm = kUntouched, degree = kUntouched;
+    EXPECT_EQ(svy_formats::ParseDMS(text, dms), c.dms);
+    EXPECT_EQ(svy_formats::ParseDMM(text, dmm), c.dmm);
+    EXPECT_EQ(svy_formats::ParseDegree(text, degree), c.degree);
+    EXPECT_EQ(svy_formats::is_str_dmm(text), c.dmm);
+    EXPECT_EQ(svy_formats::is_str_degree(text), c.degree);
+    EXPECT_NEAR(dms, c.dms ? c.degrees : kUntouched, 1e-12);
+    EXPECT_NEAR(dmm, c.dmm ? c.degrees : kUntouched, 1e-12);
+    EXPECT_NEAR(degree, c.degree ? c.degrees : kUntouched, 1e-12);
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Cases, AngleTextReading,
-    ::testing::Values(
-        TReadCase{L"45\u00B030'15.25\"", true, false, false, kDms},
-        TReadCase{L"45 30 15.25", true, false, false, kDms},
-        TReadCase{L"45:30:15,25", true, false, false, kDms},
-        TReadCase{L"45d30m15.25s", true, false, false, kDms},
-        TReadCase{L" 45\u00B0 30\u2032 15.25\u2033 ", true, false, false, kDms},
-        TReadCase{L"-12\u00B005'", true, true, false, -(12.0 + 5.0 / 60)},
-        TReadCase{L"+12 5.5", true, true, false, 12.0 + 5.5 / 60},
-        TReadCase{L"45.5\u00B0", true, true, true, 45.5}, TReadCase{L"45,5", true, true, true, 45.5},
-        TReadCase{L".5", true, true, true, 0.5}, TReadCase{L"45.", true, true, true, 45.0},
-        // Rejected forms.
-        TReadCase{L"45.5\u00B030'", false, false, false, 0},  // decimals before the last field
-        TReadCase{L"45\u00B060'", false, false, false, 0}, TReadCase{L"45 30 60", false, false, false, 0},
-        TReadCase{L"45'", false, false, false, 0},  // a minute mark on the degrees
-        TReadCase{L"45\u00B030\u00B0", false, false, false, 0},
-        TReadCase{L"45 30 15 5", false, false, false, 0}, TReadCase{L"45.30.15", false, false, false, 0},
-        TReadCase{L"1e3", false, false, false, 0}, TReadCase{L"- 45", false, false, false, 0},
-        TReadCase{L"-", false, false, false, 0}, TReadCase{L"", false, false, false, 0},
-        TReadCase{L"\u00B0", false, false, false, 0}, TReadCase{L"N45E", false, false, false, 0}));
 
 // Written text reads back to the angle within half a unit of its last decimal.
 TEST(AngleTextRoundTrip, WrittenFormsReadBack) {
