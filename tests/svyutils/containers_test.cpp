@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <list>
 #include <random>
 #include <string>
@@ -11,6 +12,7 @@ namespace {
 
 using svy_templ::CSvyArray;
 
+// Random edits agree with a vector used as the model; edits outside the array fail and change nothing.
 TEST(SvyArray, EditsLikeAVectorOverRandomOperations) {
   std::mt19937 random(3);
   std::uniform_int_distribution<int> op(0, 5);
@@ -18,64 +20,54 @@ TEST(SvyArray, EditsLikeAVectorOverRandomOperations) {
   CSvyArray<std::string> array;
   std::vector<std::string> model;
   for (int step = 0; step < 4000; ++step) {
-    const int i = index(random);
+    const int i = index(random), size = static_cast<int>(model.size());
     const std::string item = "p" + std::to_string(step);
-    const bool inside = i >= 0 && i < static_cast<int>(model.size());
+    const auto at = model.begin() + std::max(0, std::min(i, size));
     switch (op(random)) {
       case 0:
       case 1:
-        EXPECT_EQ(array.Add(item), static_cast<int>(model.size()));
+        EXPECT_EQ(array.Add(item), size);
         model.push_back(item);
         break;
-      case 2: {
-        const bool ok = i >= 0 && i <= static_cast<int>(model.size());
-        EXPECT_EQ(array.InsertAt(i, item, 2), ok);
-        if (ok) model.insert(model.begin() + i, 2, item);
+      case 2:
+        EXPECT_EQ(array.InsertAt(i, item, 2), i >= 0 && i <= size);
+        if (i >= 0 && i <= size) model.insert(at, 2, item);
         break;
-      }
-      case 3: {
-        const bool ok = i >= 0 && i + 2 <= static_cast<int>(model.size());
-        EXPECT_EQ(array.RemoveAt(i, 2), ok);
-        if (ok) model.erase(model.begin() + i, model.begin() + i + 2);
+      case 3:
+        EXPECT_EQ(array.RemoveAt(i, 2), i >= 0 && i + 2 <= size);
+        if (i >= 0 && i + 2 <= size) model.erase(at, at + 2);
         break;
-      }
       case 4:
-        EXPECT_EQ(array.SetAt(i, item), inside);
-        if (inside) model[static_cast<std::size_t>(i)] = item;
+        EXPECT_EQ(array.SetAt(i, item), i >= 0 && i < size);
+        if (i >= 0 && i < size) *at = item;
         break;
       default:
-        if (model.size() > 20) {
+        if (size > 20) {
           array.RemoveAll();
           model.clear();
         }
-        break;
     }
     ASSERT_EQ(array.GetSize(), static_cast<int>(model.size()));
   }
   for (int i = 0; i < array.GetSize(); ++i) EXPECT_EQ(array[i], model[static_cast<std::size_t>(i)]);
-}
-
-TEST(SvyArray, SizesAppendsAndCopies) {
-  CSvyArray<double> array;
-  EXPECT_TRUE(array.IsEmpty());
-  EXPECT_EQ(array.GetUpperBound(), -1);
-  array.SetSize(3);
-  EXPECT_EQ(array.GetAt(2), 0.0);
-  array[1] = 1.5;
-  array.ElementAt(2) = 2.5;
-  CSvyArray<double> other;
+  // Sizes, appends and copies.
+  CSvyArray<double> numbers, other;
+  EXPECT_EQ(numbers.GetUpperBound(), -1);
+  numbers.SetSize(3);
+  EXPECT_EQ(numbers.GetAt(2), 0.0);
+  numbers[1] = 1.5;
+  numbers.ElementAt(2) = 2.5;
   other.Add(9.0);
-  EXPECT_EQ(other.Append(array), 1);
-  EXPECT_EQ(other.GetCount(), 4);
+  EXPECT_EQ(other.Append(numbers), 1);
   EXPECT_EQ(other.GetData()[3], 2.5);
-  array.Copy(other);
+  numbers.Copy(other);
   double sum = 0.0;
-  for (double v : array) sum += v;
+  for (double v : numbers) sum += v;
   EXPECT_EQ(sum, 13.0);
-  array.SetSize(-1);
-  EXPECT_TRUE(array.IsEmpty());
-  EXPECT_FALSE(array.InsertAt(0, 1.0, -1));
-  EXPECT_FALSE(array.RemoveAt(0, -1));
+  numbers.SetSize(-1);
+  EXPECT_TRUE(numbers.IsEmpty());
+  EXPECT_FALSE(numbers.InsertAt(0, 1.0, -1));
+  EXPECT_FALSE(numbers.RemoveAt(0, -1));
 }
 
 TEST(SvyContainers, AllocatorServesVectorsAndLists) {

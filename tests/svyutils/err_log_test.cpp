@@ -14,38 +14,30 @@ namespace {
 using svy_logging::CScopedErrLogCapture;
 using svy_logging::svy_err_log;
 
-TEST(ErrLogCapture, RecordsFileLineAndMessage) {
-  const CScopedErrLogCapture capture;
-  svy_err_log("mathCurves", 120, "");
-  svy_err_log("AreaMath", 7, "segment order");
-  svy_err_log(nullptr, -1, nullptr);
-  const auto entries = capture.entries();
-  ASSERT_EQ(entries.size(), 3U);
-  EXPECT_EQ(entries[0].file, "mathCurves");
-  EXPECT_EQ(entries[0].line, 120);
-  EXPECT_EQ(entries[0].message, "");
-  EXPECT_EQ(entries[1].file, "AreaMath");
-  EXPECT_EQ(entries[1].message, "segment order");
-  EXPECT_EQ(entries[2].file, "");
-  EXPECT_EQ(entries[2].line, -1);
-}
-
-TEST(ErrLogCapture, NestedCapturesRestoreTheOuterOne) {
+// Entries keep file, line and message (null texts become empty); a nested capture takes the entries
+// logged while it lives and then restores the outer one.
+TEST(ErrLogCapture, RecordsEntriesAndNestedCapturesRestoreTheOuterOne) {
   const CScopedErrLogCapture outer;
-  svy_err_log("outer", 1, "");
+  svy_err_log("AreaMath", 7, "segment order");
   {
     const CScopedErrLogCapture inner;
     svy_err_log("inner", 2, "");
     EXPECT_EQ(inner.count(), 1U);
   }
-  svy_err_log("outer", 3, "");
+  svy_err_log(nullptr, -1, nullptr);
   const auto entries = outer.entries();
   ASSERT_EQ(entries.size(), 2U);
-  EXPECT_EQ(entries[0].line, 1);
-  EXPECT_EQ(entries[1].line, 3);
+  EXPECT_EQ(entries[0].file, "AreaMath");
+  EXPECT_EQ(entries[0].line, 7);
+  EXPECT_EQ(entries[0].message, "segment order");
+  EXPECT_EQ(entries[1].file, "");
+  EXPECT_EQ(entries[1].line, -1);
+  EXPECT_EQ(entries[1].message, "");
 }
 
-TEST(ErrLogSink, InstallReturnsThePreviousSinkAndEmptyRemovesIt) {
+// Installing a sink returns the previous one; an empty sink drops entries; a throwing sink does not reach
+// the caller.
+TEST(ErrLogSink, InstallReturnsThePreviousSinkAndThrowsNeverReachTheCaller) {
   int calls = 0;
   const auto original = svy_logging::setErrLogSink([&calls](const svy_logging::TErrLogEntry&) { ++calls; });
   svy_err_log("formats", 1, "");
@@ -55,14 +47,9 @@ TEST(ErrLogSink, InstallReturnsThePreviousSinkAndEmptyRemovesIt) {
   ASSERT_TRUE(static_cast<bool>(mine));
   mine(svy_logging::TErrLogEntry{});
   EXPECT_EQ(calls, 2);
-  svy_logging::setErrLogSink(original);
-}
-
-TEST(ErrLogSink, AThrowingSinkDoesNotReachTheCaller) {
-  const auto previous =
-      svy_logging::setErrLogSink([](const svy_logging::TErrLogEntry&) { throw std::runtime_error("sink"); });
+  svy_logging::setErrLogSink([](const svy_logging::TErrLogEntry&) { throw std::runtime_error("sink"); });
   EXPECT_NO_THROW(svy_err_log("mathAlnts", 5, ""));
-  svy_logging::setErrLogSink(previous);
+  svy_logging::setErrLogSink(original);
 }
 
 TEST(ErrLogSink, ASinkMayLogWithoutDeadlock) {

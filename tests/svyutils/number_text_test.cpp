@@ -8,6 +8,7 @@
 #include <locale>
 #include <random>
 #include <string>
+#include <utility>
 
 #include "svyutils/round_prec.h"
 #include "svyutils/svy_number_text.h"
@@ -17,92 +18,61 @@ namespace {
 
 using svy_text::CSvyString;
 
-// A sentinel that no successful parse in these tables produces, to see that failures leave it alone.
-constexpr int kIntSentinel = -424242;
-constexpr double kDoubleSentinel = -4242.4242;
-
-struct TIntCase {
-  const wchar_t* text;
-  bool ok;
-  int value;
-};
-
-class StringToIntTable : public ::testing::TestWithParam<TIntCase> {};
-
-TEST_P(StringToIntTable, ParsesWholeTextOrLeavesOutputAlone) {
-  const TIntCase& c = GetParam();
-  int value = kIntSentinel;
-  EXPECT_EQ(svy_formats::StringToInt(CSvyString(c.text), value), c.ok);
-  EXPECT_EQ(value, c.ok ? c.value : kIntSentinel);
+// Whole-text readers: a failure leaves the output at a sentinel no successful read in the tables gives.
+TEST(StringToNumber, ParsesWholeTextOrLeavesOutputAlone) {
+  constexpr int kIntSentinel = -424242;
+  constexpr double kDoubleSentinel = -4242.4242;
+  struct {
+    const wchar_t* text;
+    bool ok;
+    int value;
+  } const ints[] = {{L"+42", true, 42},         {L" \t-17 \n", true, -17},   {L"007", true, 7},
+                    {L"2147483647", true, 2147483647}, {L"-2147483648", true, -2147483647 - 1},
+                    {L"2147483648", false, 0},  {L"-2147483649", false, 0}, {L"99999999999999999999", false, 0},
+                    {L"   ", false, 0},         {L"-", false, 0},         {L"1.0", false, 0},
+                    {L"12abc", false, 0},       {L"1 2", false, 0},       {L"+-1", false, 0},
+                    {L"0x1F", false, 0},        {L"\uFF11", false, 0}};  // full-width digit
+  for (const auto& c : ints) {
+    SCOPED_TRACE(CSvyString(c.text).ToNarrow());
+    int value = kIntSentinel;
+    EXPECT_EQ(svy_formats::StringToInt(CSvyString(c.text), value), c.ok);
+    EXPECT_EQ(value, c.ok ? c.value : kIntSentinel);
+  }
+  struct {
+    const wchar_t* text;
+    bool ok;
+    double value;
+  } const doubles[] = {{L"+1.5", true, 1.5},  {L"-.5", true, -0.5},  {L"2.", true, 2.0},
+                       {L"  1234.567\t", true, 1234.567},  {L"1.25E-2", true, 0.0125}, {L"-7e+2", true, -700.0},
+                       {L"1.7976931348623157e308", true, 1.7976931348623157e308},
+                       {L"1,5", false, 0},    {L"1.5.", false, 0},   {L"1.5m", false, 0}, {L".", false, 0},
+                       {L"e5", false, 0},     {L"1e+", false, 0},    {L"", false, 0},     {L"inf", false, 0},
+                       {L"nan", false, 0},    {L"0x1p3", false, 0},  {L"1e400", false, 0}, {L"1 000", false, 0}};
+  for (const auto& c : doubles) {
+    SCOPED_TRACE(CSvyString(c.text).ToNarrow());
+    double value = kDoubleSentinel;
+    EXPECT_EQ(svy_formats::StringToDouble(CSvyString(c.text), value), c.ok);
+    EXPECT_EQ(value, c.ok ? c.value : kDoubleSentinel);
+  }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Cases, StringToIntTable,
-    ::testing::Values(TIntCase{L"0", true, 0}, TIntCase{L"42", true, 42}, TIntCase{L"+42", true, 42},
-                      TIntCase{L"-42", true, -42}, TIntCase{L" \t17 \n", true, 17}, TIntCase{L"007", true, 7},
-                      TIntCase{L"2147483647", true, 2147483647},
-                      TIntCase{L"-2147483648", true, -2147483647 - 1}, TIntCase{L"2147483648", false, 0},
-                      TIntCase{L"-2147483649", false, 0}, TIntCase{L"99999999999999999999", false, 0},
-                      TIntCase{L"", false, 0}, TIntCase{L"   ", false, 0}, TIntCase{L"+", false, 0},
-                      TIntCase{L"-", false, 0}, TIntCase{L"1.0", false, 0}, TIntCase{L"12abc", false, 0},
-                      TIntCase{L"1 2", false, 0}, TIntCase{L"--1", false, 0}, TIntCase{L"+-1", false, 0},
-                      TIntCase{L"0x1F", false, 0}, TIntCase{L"\uFF11", false, 0}));  // full-width digit
-
-struct TDoubleCase {
-  const wchar_t* text;
-  bool ok;
-  double value;
-};
-
-class StringToDoubleTable : public ::testing::TestWithParam<TDoubleCase> {};
-
-TEST_P(StringToDoubleTable, ParsesWholeTextOrLeavesOutputAlone) {
-  const TDoubleCase& c = GetParam();
-  double value = kDoubleSentinel;
-  EXPECT_EQ(svy_formats::StringToDouble(CSvyString(c.text), value), c.ok);
-  EXPECT_EQ(value, c.ok ? c.value : kDoubleSentinel);
+// Rounds half away from zero on the written decimal (binary neighbours below the half still round up).
+TEST(DoubleToString, RoundsHalfAwayFromZeroOnTheWrittenDecimal) {
+  constexpr double kInf = std::numeric_limits<double>::infinity();
+  struct {
+    double value;
+    int decimals;
+    const wchar_t* text;
+  } const cases[] = {{-2.675, 2, L"-2.68"}, {1.005, 2, L"1.01"},     {-0.5, 0, L"-1"},      {1.5, 3, L"1.500"},
+                     {9.995, 2, L"10.00"},  {-0.001, 2, L"0.00"},    {-0.0, 1, L"0.0"},     {0.04, 1, L"0.0"},
+                     {1250.0, -2, L"1300"}, {-49.0, -2, L"0"},       {0.1, 25, L"0.10000000000000000"},
+                     {1e21, 2, L"1000000000000000000000.00"},       {123456789.125, 2, L"123456789.13"},
+                     {std::numeric_limits<double>::quiet_NaN(), 2, L"nan"}, {-kInf, 2, L"-inf"}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(::testing::Message() << c.value << " decimals " << c.decimals);
+    EXPECT_EQ(svy_formats::DoubleToString(c.value, c.decimals).str(), c.text);
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Cases, StringToDoubleTable,
-    ::testing::Values(
-        TDoubleCase{L"1.5", true, 1.5}, TDoubleCase{L"-1.5", true, -1.5}, TDoubleCase{L"+1.5", true, 1.5},
-        TDoubleCase{L".5", true, 0.5}, TDoubleCase{L"-.5", true, -0.5}, TDoubleCase{L"2.", true, 2.0},
-        TDoubleCase{L"  1234.567\t", true, 1234.567}, TDoubleCase{L"1e3", true, 1000.0},
-        TDoubleCase{L"1.25E-2", true, 0.0125}, TDoubleCase{L"-7e+2", true, -700.0},
-        TDoubleCase{L"0.1", true, 0.1}, TDoubleCase{L"1.7976931348623157e308", true, 1.7976931348623157e308},
-        TDoubleCase{L"1,5", false, 0}, TDoubleCase{L"1.5.", false, 0}, TDoubleCase{L"1.5m", false, 0},
-        TDoubleCase{L".", false, 0}, TDoubleCase{L"-", false, 0}, TDoubleCase{L"e5", false, 0},
-        TDoubleCase{L"1e", false, 0}, TDoubleCase{L"1e+", false, 0}, TDoubleCase{L"", false, 0},
-        TDoubleCase{L"inf", false, 0}, TDoubleCase{L"nan", false, 0}, TDoubleCase{L"0x1p3", false, 0},
-        TDoubleCase{L"1e400", false, 0}, TDoubleCase{L"1 000", false, 0}, TDoubleCase{L"--1", false, 0}));
-
-struct TFormatCase {
-  double value;
-  int decimals;
-  const wchar_t* text;
-};
-
-class DoubleToStringTable : public ::testing::TestWithParam<TFormatCase> {};
-
-TEST_P(DoubleToStringTable, RoundsHalfAwayFromZeroOnTheWrittenDecimal) {
-  const TFormatCase& c = GetParam();
-  EXPECT_EQ(svy_formats::DoubleToString(c.value, c.decimals).str(), c.text);
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Cases, DoubleToStringTable,
-    ::testing::Values(
-        TFormatCase{2.675, 2, L"2.68"}, TFormatCase{-2.675, 2, L"-2.68"}, TFormatCase{1.005, 2, L"1.01"},
-        TFormatCase{0.125, 2, L"0.13"}, TFormatCase{0.5, 0, L"1"}, TFormatCase{-0.5, 0, L"-1"},
-        TFormatCase{1.5, 3, L"1.500"}, TFormatCase{9.995, 2, L"10.00"}, TFormatCase{-0.001, 2, L"0.00"},
-        TFormatCase{-0.0, 1, L"0.0"}, TFormatCase{0.0, 0, L"0"}, TFormatCase{0.04, 1, L"0.0"},
-        TFormatCase{0.05, 1, L"0.1"}, TFormatCase{1234.5, -2, L"1200"}, TFormatCase{1250.0, -2, L"1300"},
-        TFormatCase{-49.0, -2, L"0"}, TFormatCase{0.1, 25, L"0.10000000000000000"},
-        TFormatCase{1e21, 2, L"1000000000000000000000.00"}, TFormatCase{123456789.125, 2, L"123456789.13"},
-        TFormatCase{std::numeric_limits<double>::quiet_NaN(), 2, L"nan"},
-        TFormatCase{std::numeric_limits<double>::infinity(), 2, L"inf"},
-        TFormatCase{-std::numeric_limits<double>::infinity(), 2, L"-inf"}));
 
 TEST(DoubleToString, HugeValuesPrintEveryIntegerDigit) {
   const std::wstring text = svy_formats::DoubleToString(std::numeric_limits<double>::max(), 2).str();
@@ -131,18 +101,14 @@ TEST(NumberTextRoundTrip, WrittenTextReadsBackAsTheRoundedValue) {
 }
 
 TEST(NumberTextRoundTrip, ShortestTextsSurviveValueAndBack) {
-  const wchar_t* const texts[] = {L"0.1", L"2.675", L"-1234.567", L"500000.001", L"5000000.125", L"1e-07"};
-  const int places[] = {1, 3, 3, 3, 3, 7};
-  for (std::size_t i = 0; i < sizeof texts / sizeof texts[0]; ++i) {
-    double value = 0.0;
-    ASSERT_TRUE(svy_formats::StringToDouble(CSvyString(texts[i]), value));
-    double again = 0.0;
-    ASSERT_TRUE(svy_formats::StringToDouble(svy_formats::DoubleToString(value, places[i]), again));
-    EXPECT_EQ(again, value) << i;
+  const std::pair<const wchar_t*, int> texts[] = {{L"0.1", 1},         {L"2.675", 3},       {L"-1234.567", 3},
+                                                  {L"5000000.125", 3}, {L"1e-07", 7}};
+  for (const auto& t : texts) {
+    double value = 0.0, again = 0.0;
+    ASSERT_TRUE(svy_formats::StringToDouble(CSvyString(t.first), value));
+    ASSERT_TRUE(svy_formats::StringToDouble(svy_formats::DoubleToString(value, t.second), again));
+    EXPECT_EQ(again, value) << t.second;
   }
-}
-
-TEST(ReplaceCommasWithDecPt, ReplacesEveryComma) {
   CSvyString text(L"1,5;2,25,");
   svy_formats::ReplaceCommasWithDecPt(text);
   EXPECT_EQ(text.str(), L"1.5;2.25.");

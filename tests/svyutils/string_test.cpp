@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <utility>
 
 #include "svyutils/svy_string.h"
 
@@ -10,49 +11,25 @@ using svy_text::CSvyString;
 using svy_text::kCodePageCLocale;
 using svy_text::kCodePageUtf8;
 
-struct TUtf8Case {
-  const char* utf8;
-  std::wstring wide;
-};
-
-class SvyStringUtf8 : public ::testing::TestWithParam<TUtf8Case> {};
-
-TEST_P(SvyStringUtf8, DecodesAndEncodesBack) {
-  const TUtf8Case& c = GetParam();
-  const CSvyString text(c.utf8, kCodePageUtf8);
-  EXPECT_EQ(text.str(), c.wide);
-  EXPECT_EQ(text.ToNarrow(kCodePageUtf8), std::string(c.utf8));
-}
-
-INSTANTIATE_TEST_SUITE_P(WellFormed, SvyStringUtf8,
-                         ::testing::Values(TUtf8Case{"", L""}, TUtf8Case{"N 12.5", L"N 12.5"},
-                                           TUtf8Case{"45\xC2\xB0"
-                                                     "30'",
-                                                     L"45\u00B030'"},                 // degree sign, 2 bytes
-                                           TUtf8Case{"\xE2\x82\xAC 5", L"\u20AC 5"},  // euro sign, 3 bytes
-                                           TUtf8Case{"\xF0\x9D\x84\x9E",
-                                                     std::wstring(L"\U0001D11E")}));  // 4 bytes
-
-TEST(SvyStringUtf8Malformed, BecomesReplacementCharacterAndContinues) {
-  struct {
-    const char* bytes;
-    std::wstring expected;
-  } const cases[] = {
-      {"a\x80"
-       "b",
-       L"a\uFFFDb"},                                      // stray continuation byte
-      {"a\xC3", L"a\uFFFD"},                              // truncated at the end of the text
-      {"\xC0\xAF", L"\uFFFD\uFFFD"},                      // overlong '/'
-      {"\xED\xA0\x80", L"\uFFFD\uFFFD\uFFFD"},            // encoded surrogate
-      {"\xF4\x90\x80\x80", L"\uFFFD\uFFFD\uFFFD\uFFFD"},  // beyond U+10FFFF
-      {"\xFF"
-       "x",
-       L"\uFFFDx"},
-  };
-  for (const auto& c : cases) {
-    SCOPED_TRACE(c.bytes);
-    EXPECT_EQ(CSvyString(c.bytes, kCodePageUtf8).str(), c.expected);
+// Well-formed text decodes and encodes back; each malformed byte becomes one replacement character.
+TEST(SvyStringUtf8, DecodesEncodesBackAndReplacesMalformedBytes) {
+  const std::pair<const char*, std::wstring> wellFormed[] = {
+      {"", L""}, {"45\xC2\xB0" "30'", L"45\u00B030'"},  // degree sign, 2 bytes
+      {"\xE2\x82\xAC 5", L"\u20AC 5"},                  // euro sign, 3 bytes
+      {"\xF0\x9D\x84\x9E", std::wstring(L"\U0001D11E")}};  // 4 bytes
+  for (const auto& c : wellFormed) {
+    const CSvyString text(c.first, kCodePageUtf8);
+    EXPECT_EQ(text.str(), c.second);
+    EXPECT_EQ(text.ToNarrow(kCodePageUtf8), std::string(c.first));
   }
+  const std::pair<const char*, std::wstring> malformed[] = {
+      {"a\x80" "b", L"a\uFFFDb"},                      // stray continuation byte
+      {"a\xC3", L"a\uFFFD"},                           // truncated at the end of the text
+      {"\xC0\xAF", L"\uFFFD\uFFFD"},                   // overlong '/'
+      {"\xED\xA0\x80", L"\uFFFD\uFFFD\uFFFD"},         // encoded surrogate
+      {"\xF4\x90\x80\x80", L"\uFFFD\uFFFD\uFFFD\uFFFD"},  // beyond U+10FFFF
+      {"\xFF" "x", L"\uFFFDx"}};                       // no lead byte
+  for (const auto& c : malformed) EXPECT_EQ(CSvyString(c.first, kCodePageUtf8).str(), c.second) << c.first;
 }
 
 TEST(SvyStringCLocale, MapsEveryByteToTheSameCodePoint) {
@@ -67,18 +44,11 @@ TEST(SvyStringCLocale, MapsEveryByteToTheSameCodePoint) {
 
 TEST(SvyStringSearch, FindsAndReportsMinusOne) {
   const CSvyString text(L"12+345.67+8");
-  EXPECT_EQ(text.Find(L'+'), 2);
-  EXPECT_EQ(text.Find(L'+', 3), 9);
-  EXPECT_EQ(text.Find(L'+', 10), -1);
-  EXPECT_EQ(text.Find(L'+', -1), -1);
-  EXPECT_EQ(text.Find(L"45"), 4);
-  EXPECT_EQ(text.Find(L"45", 5), -1);
-  EXPECT_EQ(text.Find(L"", 11), 11);
-  EXPECT_EQ(text.Find(L"x", 99), -1);
-  EXPECT_EQ(text.ReverseFind(L'+'), 9);
-  EXPECT_EQ(text.FindOneOf(L".+"), 2);
-  EXPECT_EQ(text.FindOneOf(L"xyz"), -1);
-  EXPECT_EQ(text.FindOneOf(L""), -1);
+  const int found[][2] = {{text.Find(L'+', 3), 9},    {text.Find(L'+', 10), -1}, {text.Find(L'+', -1), -1},
+                          {text.Find(L"45"), 4},       {text.Find(L"45", 5), -1}, {text.Find(L"", 11), 11},
+                          {text.Find(L"x", 99), -1},   {text.ReverseFind(L'+'), 9}, {text.FindOneOf(L".+"), 2},
+                          {text.FindOneOf(L"xyz"), -1}, {text.FindOneOf(L""), -1}};
+  for (const auto& f : found) EXPECT_EQ(f[0], f[1]) << (&f - found);
 }
 
 TEST(SvyStringSubstrings, ClampToTheText) {
@@ -86,12 +56,9 @@ TEST(SvyStringSubstrings, ClampToTheText) {
   struct {
     CSvyString actual;
     const wchar_t* expected;
-  } const cases[] = {
-      {text.Mid(2), L"cdef"},   {text.Mid(2, 2), L"cd"}, {text.Mid(-3, 2), L"ab"},
-      {text.Mid(4, 99), L"ef"}, {text.Mid(9), L""},      {text.Mid(1, -1), L""},
-      {text.Left(2), L"ab"},    {text.Left(-1), L""},    {text.Left(99), L"abcdef"},
-      {text.Right(2), L"ef"},   {text.Right(-1), L""},   {text.Right(99), L"abcdef"},
-  };
+  } const cases[] = {{text.Mid(2, 2), L"cd"}, {text.Mid(-3, 2), L"ab"}, {text.Mid(4, 99), L"ef"},
+                     {text.Mid(9), L""},      {text.Mid(1, -1), L""},   {text.Left(-1), L""},
+                     {text.Left(99), L"abcdef"}, {text.Right(2), L"ef"}, {text.Right(-1), L""}};
   for (const auto& c : cases) EXPECT_EQ(c.actual.str(), c.expected);
 }
 
@@ -141,17 +108,10 @@ TEST(SvyStringCompare, OrdinalAndCaseFolded) {
     int ordinal;
     int noCase;
   } const cases[] = {
-      {L"abc", L"abc", 0, 0},
-      {L"abc", L"ABC", 1, 0},
-      {L"abc", L"abd", -1, -1},
-      {L"ab", L"abc", -1, -1},
-      {L"abc", L"AB", 1, 1},
-      {L"", L"", 0, 0},
+      {L"abc", L"ABC", 1, 0}, {L"abc", L"abd", -1, -1}, {L"ab", L"abc", -1, -1}, {L"abc", L"AB", 1, 1},
+      {L"", L"", 0, 0},       {L" 45", L"360", -1, -1},
       {L"\u00C9t\u00C9", L"\u00E9T\u00E9", -1, 0},  // Latin-1 letters fold too
-      {L"\u00D7", L"\u00F7", -1, -1},               // the signs are no letters
-      {L"360", L"360", 0, 0},
-      {L" 45", L"360", -1, -1},
-  };
+      {L"\u00D7", L"\u00F7", -1, -1}};              // the signs are no letters
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << "case " << (&c - cases));
     const int ordinal = CSvyString(c.a).Compare(c.b);
@@ -203,11 +163,8 @@ TEST(SvyStringFormat, PositionalArgumentsAndUnconvertibleNarrowText) {
   // A narrow byte beyond ASCII has no meaning in the C locale: the text is empty, quickly.
   text.Format(L"%hs", "\xC3\xA9");
   EXPECT_TRUE(text.IsEmpty());
-}
-
-TEST(SvyStringFormat, GrowsForLongOutput) {
+  // Long output grows the buffer.
   const std::wstring longText(5000, L'z');
-  CSvyString text;
   text.Format(L"<%ls>%d", longText.c_str(), 42);
   EXPECT_EQ(text.str(), L"<" + longText + L">42");
 }
