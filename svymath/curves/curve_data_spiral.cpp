@@ -75,14 +75,7 @@ double CCurveDataSpiral::GetAzimuth(double s) const {
 }
 
 bool CCurveDataSpiral::getPosAtLength(double s, double& north, double& east) const {
-  if (!m_law->isok()) {
-    logFailure(__LINE__);
-    return false;
-  }
-  if (!svy_math::snapToRange(s, 0.0, getTotalLength())) {
-    logFailure(__LINE__);
-    return false;
-  }
+  if (!checkLength(s)) return false;
   if (!m_isTSSC) return fullPosAtLength(s, north, east);
   double n = 0.0;
   double e = 0.0;

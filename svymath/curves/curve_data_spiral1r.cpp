@@ -8,6 +8,7 @@
 #include "svymath/foundation/constants.h"
 #include "svyutils/svy_err_log.h"
 
+using svy_math::tol::kProjectionLength;
 using svy_math::tol::kZero;
 
 namespace {
@@ -15,14 +16,13 @@ namespace {
 // The kind code of spiral data, shared with the alignment's spiral element.
 constexpr int kSpiralDataType = 2;
 
-// Projection of a point onto the spiral: the element is sampled at this many intervals to find the nearest
-// stretch, which a golden-section search then narrows. 32 intervals keep each stretch short enough (a
-// sixty-fourth of a half turn or less for ordinary spirals) that the distance has one minimum in it.
+// Projection of a point onto the spiral: the element is sampled at this many intervals to bracket every
+// foot point (a spiral turns by less than a quarter turn over a sample interval, so each interval holds at
+// most one minimum of the distance).
 constexpr int kProjectionSamples = 32;
-// The golden-section search stops when the bracket is this short (metres); far below a survey millimetre.
-constexpr double kProjectionLengthTol = 1e-10;
-constexpr int kProjectionMaxIterations = 200;
-constexpr double kInvGolden = 0.6180339887498949;  // (sqrt(5) - 1) / 2
+// Cap of the refinement in one bracket. Newton converges in a handful of steps and the bisection fallback
+// halves the bracket each step, so 100 steps reach below kProjectionLength for any bracket up to 1e20 m.
+constexpr int kRefineIterationCap = 100;
 
 // The step search narrows the largest admissible chord to this fraction of the step.
 constexpr double kStepRelTol = 1e-9;
@@ -152,7 +152,7 @@ bool CCurveDataSpiral1R::fullPosAtLength(double s, double& north, double& east) 
   return true;
 }
 
-bool CCurveDataSpiral1R::getPosAtLength(double s, double& north, double& east) const {
+bool CCurveDataSpiral1R::checkLength(double& s) const {
   if (!m_law->isok()) {
     logFailure(__LINE__);
     return false;
@@ -161,7 +161,11 @@ bool CCurveDataSpiral1R::getPosAtLength(double s, double& north, double& east) c
     logFailure(__LINE__);
     return false;
   }
-  return fullPosAtLength(s, north, east);
+  return true;
+}
+
+bool CCurveDataSpiral1R::getPosAtLength(double s, double& north, double& east) const {
+  return checkLength(s) && fullPosAtLength(s, north, east);
 }
 
 double CCurveDataSpiral1R::getCurvatureAtLength(double s) const {
@@ -206,61 +210,73 @@ double CCurveDataSpiral1R::getStepForDeviation(double s, double dev) const {
   return fullStepForDeviation(s, dev, total);
 }
 
+double CCurveDataSpiral1R::TFoot::distance() const { return std::hypot(along, offset); }
+
+bool CCurveDataSpiral1R::componentsAt(double north, double east, double s, double& along, double& offset) const {
+  double onNorth = 0.0;
+  double onEast = 0.0;
+  if (!getPosAtLength(s, onNorth, onEast)) return false;
+  const double azimuth = GetAzimuth(s) * svy_math::units::kDegToRad;
+  const double dN = north - onNorth;
+  const double dE = east - onEast;
+  along = std::cos(azimuth) * dN + std::sin(azimuth) * dE;
+  offset = svy_math::detail::offsetAcross(north, east, onNorth, onEast, azimuth);
+  return std::isfinite(along) && std::isfinite(offset);
+}
+
+bool CCurveDataSpiral1R::findFoot(double north, double east, TFoot& foot) const {
+  const double total = getTotalLength();
+  if (!isok() || !(total >= 0.0) || !std::isfinite(total)) return false;
+  TFoot best;
+  if (!componentsAt(north, east, 0.0, best.along, best.offset)) return false;
+  double lo = 0.0;
+  double loAlong = best.along;
+  for (int i = 1; i <= kProjectionSamples; ++i) {
+    const double hi = total * i / kProjectionSamples;
+    TFoot sample;
+    sample.length = hi;
+    if (!componentsAt(north, east, hi, sample.along, sample.offset)) return false;
+    if (i == kProjectionSamples && sample.distance() < best.distance()) best = sample;
+    // The distance has a minimum where the along component falls through zero.
+    if (loAlong > 0.0 && sample.along <= 0.0) {
+      double a = lo;
+      double b = hi;
+      double s = a + (b - a) * loAlong / (loAlong - sample.along);
+      TFoot candidate;
+      for (int iteration = 0; iteration < kRefineIterationCap; ++iteration) {
+        candidate.length = s;
+        if (!componentsAt(north, east, s, candidate.along, candidate.offset)) return false;
+        if (candidate.along > 0.0) {
+          a = s;
+        } else {
+          b = s;
+        }
+        // d(along)/ds = -1 + curvature * offset: negative wherever the point is a distance minimum.
+        const double slope = -1.0 + getCurvatureAtLength(s) * candidate.offset;
+        double next = slope < 0.0 ? s - candidate.along / slope : 0.5 * (a + b);
+        if (!(next > a && next < b)) next = 0.5 * (a + b);
+        const bool converged = std::fabs(next - s) < kProjectionLength || b - a < kProjectionLength;
+        s = next;
+        if (converged) break;
+      }
+      candidate.length = s;
+      if (!componentsAt(north, east, s, candidate.along, candidate.offset)) return false;
+      candidate.interior = true;
+      if (candidate.distance() < best.distance()) best = candidate;
+    }
+    lo = hi;
+    loAlong = sample.along;
+  }
+  foot = best;
+  return true;
+}
+
 bool CCurveDataSpiral1R::getShortestDistAndCurveLen(double north, double east, double& dist,
                                                     double& len) const {
-  if (!m_law->isok() || std::isnan(north) || std::isnan(east)) return false;
-  const double total = getTotalLength();
-  if (!(total >= 0.0) || std::isinf(total)) return false;
-  auto dist2 = [&](double s) {
-    double n = 0.0;
-    double e = 0.0;
-    if (!getPosAtLength(s, n, e)) return svy_math::undefinedValue();
-    return (north - n) * (north - n) + (east - e) * (east - e);
-  };
-  double bestLen = 0.0;
-  double best = dist2(0.0);
-  for (int k = 1; k <= kProjectionSamples; ++k) {
-    const double s = total * k / kProjectionSamples;
-    const double d = dist2(s);
-    if (d < best) {
-      best = d;
-      bestLen = s;
-    }
-  }
-  if (std::isnan(best)) return false;
-  const double interval = total / kProjectionSamples;
-  double lo = std::fmax(0.0, bestLen - interval);
-  double hi = std::fmin(total, bestLen + interval);
-  double x1 = hi - kInvGolden * (hi - lo);
-  double x2 = lo + kInvGolden * (hi - lo);
-  double d1 = dist2(x1);
-  double d2 = dist2(x2);
-  for (int i = 0; i < kProjectionMaxIterations && hi - lo > kProjectionLengthTol; ++i) {
-    if (d1 < d2) {
-      hi = x2;
-      x2 = x1;
-      d2 = d1;
-      x1 = hi - kInvGolden * (hi - lo);
-      d1 = dist2(x1);
-    } else {
-      lo = x1;
-      x1 = x2;
-      d1 = d2;
-      x2 = lo + kInvGolden * (hi - lo);
-      d2 = dist2(x2);
-    }
-  }
-  const double refined = 0.5 * (lo + hi);
-  const double dRefined = dist2(refined);
-  if (dRefined < best) {
-    best = dRefined;
-    bestLen = refined;
-  }
-  double n = 0.0;
-  double e = 0.0;
-  if (!getPosAtLength(bestLen, n, e)) return false;
-  dist = svy_math::detail::signedDistance(north, east, n, e, GetAzimuth(bestLen) * svy_math::units::kDegToRad);
-  len = bestLen;
+  TFoot foot;
+  if (!findFoot(north, east, foot)) return false;
+  len = foot.length;
+  dist = foot.offset < 0.0 ? -foot.distance() : foot.distance();
   return true;
 }
 

@@ -72,6 +72,17 @@ class SVYMATH_API CCurveDataSpiral1R {
   // distance (positive when the point lies right of the direction of travel at that length). An end point
   // is returned (len 0 or the total length) when the nearest point is an end. False for undefined data.
   bool getShortestDistAndCurveLen(double north, double east, double& dist, double& len) const;
+  // The nearest foot of a perpendicular from the local point, or the nearer end, by 32 samples and then a
+  // bracketed Newton search on the foot-point condition (bisection fallback) converging to
+  // tol::kProjectionLength. False for undefined data or a non-finite point.
+  struct TFoot {
+    double length = 0.0;    // length of the foot (or end) on the element
+    double along = 0.0;     // component along the tangent there (0 at a true foot)
+    double offset = 0.0;    // component square to the tangent, positive to the right
+    bool interior = false;  // a foot of the perpendicular, not an end
+    double distance() const;
+  };
+  bool findFoot(double north, double east, TFoot& foot) const;
 
   // Local end point and end direction (relative to the start tangent).
   double getFinalNorthing() const;
@@ -105,8 +116,12 @@ class SVYMATH_API CCurveDataSpiral1R {
   std::uint32_t getAlntElementFlags() const { return m_flags; }
 
  protected:
+  // Components along and across the tangent at length s of the vector from that point to the local point.
+  bool componentsAt(double north, double east, double s, double& along, double& offset) const;
   // Law length s of element length s (the law runs backwards under a CS-to-ST element).
   double lawLength(double s) const { return m_isTSSC ? s : m_law->getLength() - s; }
+  // True for defined data and s within [0, total length] after the snap (s snapped); logged otherwise.
+  bool checkLength(double& s) const;
   // Position of the full spiral at element length s without the range check.
   bool fullPosAtLength(double s, double& north, double& east) const;
   // The largest step from full-spiral element length s within dev, not past limit (element length).

@@ -34,9 +34,4 @@ class SVYMATH_API CCurveSpiral : public COrgAzCurveT<CCurveDataSpiral, CGenericS
   double getSpiralParam() const override;
   // The length at which the element's tangent has the given (world) azimuth.
   double getLengthAtAzimuth(const CMathAngle& azimuth) const override;
-
- private:
-  struct TFoot;
-  // The nearest foot point or end of the element to the local point; false for undefined data.
-  bool findFoot(double localNorth, double localEast, TFoot& foot) const;
 };
