@@ -18,109 +18,61 @@ constexpr double kTwoPi = svy_math::units::kTwoPi;
 const double kNaN = std::numeric_limits<double>::quiet_NaN();
 const double kInf = std::numeric_limits<double>::infinity();
 
-struct RangeCase {
-  double x, lo, hi, expected;
-};
-
-class ToRange : public ::testing::TestWithParam<RangeCase> {};
-
-TEST_P(ToRange, KeepsBothEndsAndWrapsByWholePeriods) {
-  const RangeCase& c = GetParam();
-  EXPECT_NEAR(toRange(c.x, c.lo, c.hi), c.expected, 1e-12) << c.x;
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Cases, ToRange,
-    ::testing::Values(RangeCase{kPi, -kPi, kPi, kPi}, RangeCase{-kPi, -kPi, kPi, -kPi},
-                      RangeCase{3 * kPi, -kPi, kPi, kPi}, RangeCase{-3 * kPi, -kPi, kPi, -kPi},
-                      RangeCase{kTwoPi, 0, kTwoPi, kTwoPi}, RangeCase{0, 0, kTwoPi, 0},
-                      RangeCase{360, 0, 360, 360}, RangeCase{-30, 0, 360, 330}, RangeCase{725, 0, 360, 5},
-                      RangeCase{7, 5, 5, 5}, RangeCase{7, 9, 5, 9}));
-
-TEST(ToRange, HugeAndNonFiniteInputTerminateInRange) {
+// Both ends of the range are kept; values wrap by whole periods; an empty or inverted range gives its low
+// end. Huge input ends in range, non-finite input gives NaN.
+TEST(ToRange, KeepsBothEndsWrapsByWholePeriodsAndTerminates) {
+  const double cases[][4] = {{kPi, -kPi, kPi, kPi},         {-kPi, -kPi, kPi, -kPi},   {3 * kPi, -kPi, kPi, kPi},
+                             {-3 * kPi, -kPi, kPi, -kPi},   {kTwoPi, 0, kTwoPi, kTwoPi}, {360, 0, 360, 360},
+                             {-30, 0, 360, 330},            {725, 0, 360, 5},          {7, 5, 5, 5},
+                             {7, 9, 5, 9},
+                             // Just beyond the loop limit the fmod reduction agrees with the loop.
+                             {100 * kTwoPi + 1.0, -kPi, kPi, 1.0}, {-100 * 360.0 - 10.0, 0, 360, 350}};
+  for (const auto& c : cases) EXPECT_NEAR(toRange(c[0], c[1], c[2]), c[3], 1e-9) << c[0] << " " << c[1];
   EXPECT_TRUE(std::isnan(toRange(kNaN, -kPi, kPi)));
   EXPECT_TRUE(std::isnan(toRange(kInf, -kPi, kPi)));
   EXPECT_TRUE(std::isnan(toRange(-kInf, 0.0, 360.0)));
-  for (double x : {1e300, -1e300, 1e17, -4e9, 1e100}) {
-    const double r = toRange(x, -kPi, kPi);
-    EXPECT_GE(r, -kPi) << x;
-    EXPECT_LE(r, kPi) << x;
-    const double d = toRange(x, 0.0, 360.0);
-    EXPECT_GE(d, 0) << x;
-    EXPECT_LE(d, 360) << x;
+  for (double x : {1e300, -1e300, 1e17, -4e9}) {
+    const double r = toRange(x, -kPi, kPi), d = toRange(x, 0.0, 360.0);
+    EXPECT_TRUE(r >= -kPi && r <= kPi && d >= 0 && d <= 360) << x;
   }
-  // Just beyond the loop limit the fmod reduction agrees with the loop.
-  EXPECT_NEAR(toRange(100 * kTwoPi + 1.0, -kPi, kPi), 1.0, 1e-12);
-  EXPECT_NEAR(toRange(-100 * 360.0 - 10.0, 0.0, 360.0), 350.0, 1e-9);
-}
-
-TEST(ToRange, IntegerFormWrapsLikeTheRealForm) {
-  for (int x = -1000; x <= 1000; x += 7) {
+  // The integer form wraps like the real one and survives the ends of int.
+  for (int x = -1000; x <= 1000; x += 7)
     EXPECT_EQ(toRange(x, 0, 360), static_cast<int>(toRange(static_cast<double>(x), 0.0, 360.0))) << x;
-  }
   EXPECT_EQ(toRange(360, 0, 360), 360);
   EXPECT_EQ(toRange(5, 3, 3), 3);
   const int far = toRange(std::numeric_limits<int>::min(), -180, 180);
-  EXPECT_GE(far, -180);
-  EXPECT_LE(far, 180);
-  const int farUp = toRange(std::numeric_limits<int>::max(), std::numeric_limits<int>::min(), 0);
-  EXPECT_LE(farUp, 0);
+  EXPECT_TRUE(far >= -180 && far <= 180);
+  EXPECT_LE(toRange(std::numeric_limits<int>::max(), std::numeric_limits<int>::min(), 0), 0);
 }
 
-struct NormalizeCase {
-  double (*fn)(double);
-  const char* name;
-  double x, expected;
-};
-
-class RadianNormalizers : public ::testing::TestWithParam<NormalizeCase> {};
-
-TEST_P(RadianNormalizers, GiveTheirDocumentedRanges) {
-  const NormalizeCase& c = GetParam();
-  EXPECT_NEAR(c.fn(c.x), c.expected, 1e-12) << c.name << "(" << c.x << ")";
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Cases, RadianNormalizers,
-    ::testing::Values(NormalizeCase{Normalize0To2PI, "0To2PI", kTwoPi, kTwoPi},
-                      NormalizeCase{Normalize0To2PI, "0To2PI", 0, 0},
-                      NormalizeCase{Normalize0To2PI, "0To2PI", -1, kTwoPi - 1},
-                      NormalizeCase{Normalize0ToLt2Pi, "0ToLt2Pi", kTwoPi, 0},
-                      NormalizeCase{Normalize0ToLt2Pi, "0ToLt2Pi", -kTwoPi, 0},
-                      NormalizeCase{Normalize0ToPi, "0ToPi", 4, 4 - kTwoPi},
-                      NormalizeCase{Normalize0ToPi, "0ToPi", kPi, kPi},
-                      NormalizeCase{Normalize0ToPi, "0ToPi", -1, -1},
-                      NormalizeCase{NormalizeNegPiToPi, "NegPiToPi", -kPi, kPi},
-                      NormalizeCase{NormalizeNegPiToPi, "NegPiToPi", kPi, kPi},
-                      NormalizeCase{NormalizeNegPiToPi, "NegPiToPi", 0, 0},
-                      NormalizeCase{NormalizeNegPiToPi, "NegPiToPi", 3 * kPi, kPi},
-                      NormalizeCase{NormalizeGtNegPiToPi, "GtNegPiToPi", -kPi, kPi},
-                      NormalizeCase{NormalizeGtNegPiToPi, "GtNegPiToPi", -3, -3},
-                      NormalizeCase{NormalizeGtNegPiToPi, "GtNegPiToPi", 10, 10 - 2 * kTwoPi}));
-
-TEST(RadianNormalizers, PassNonFiniteThroughAndSurviveHugeValues) {
+TEST(RadianNormalizers, GiveTheirDocumentedRangesAndPassNonFiniteThrough) {
+  struct {
+    double (*fn)(double);
+    double x, expected;
+  } const cases[] = {{Normalize0To2PI, kTwoPi, kTwoPi},        {Normalize0To2PI, -1, kTwoPi - 1},
+                     {Normalize0ToLt2Pi, kTwoPi, 0},           {Normalize0ToLt2Pi, -kTwoPi, 0},
+                     {Normalize0ToPi, 4, 4 - kTwoPi},          {Normalize0ToPi, kPi, kPi},
+                     {Normalize0ToPi, -1, -1},                 {NormalizeNegPiToPi, -kPi, kPi},
+                     {NormalizeNegPiToPi, 3 * kPi, kPi},       {NormalizeGtNegPiToPi, -kPi, kPi},
+                     {NormalizeGtNegPiToPi, -3, -3},           {NormalizeGtNegPiToPi, 10, 10 - 2 * kTwoPi}};
+  for (const auto& c : cases) EXPECT_NEAR(c.fn(c.x), c.expected, 1e-12) << (&c - cases);
   for (auto fn : {Normalize0To2PI, Normalize0ToLt2Pi, Normalize0ToPi, NormalizeNegPiToPi, NormalizeGtNegPiToPi}) {
     EXPECT_TRUE(std::isnan(fn(kNaN)));
     EXPECT_EQ(fn(kInf), kInf);
     EXPECT_EQ(fn(-kInf), -kInf);
-    const double r = fn(1e300);
-    EXPECT_GT(r, -kPi - 1e-9);
-    EXPECT_LE(r, kTwoPi);
+    EXPECT_TRUE(fn(1e300) > -kPi - 1e-9 && fn(1e300) <= kTwoPi);
   }
   const double r = Normalize0ToLt2Pi(-1e300);
-  EXPECT_GE(r, 0.0);
-  EXPECT_LT(r, kTwoPi);
+  EXPECT_TRUE(r >= 0.0 && r < kTwoPi);
 }
-
-struct Reducer {
-  const char* name;
-  double (*fn)(double);
-  double lo, hi;
-};
 
 // Every degree reduction ends on absurd input: NaN and infinities give NaN, huge values land in range.
 TEST(DegreeReductions, TerminateInRangeOnAbsurdInput) {
-  const Reducer reducers[] = {
+  struct {
+    const char* name;
+    double (*fn)(double);
+    double lo, hi;
+  } const reducers[] = {
       {"ModDeg360", [](double x) { return ModDeg360(x, true); }, 0, 360},
       {"ModDeg180", [](double x) { return ModDeg180(x, false); }, -180, 180},
       {"pos360", pos360, 0, 360},
@@ -131,45 +83,31 @@ TEST(DegreeReductions, TerminateInRangeOnAbsurdInput) {
       {"Deg2DDMMDEC", [](double x) { return Deg2DDMMDEC(x, 4, false); }, -360, 360},
       {"Deg2Rad", [](double x) { return Deg2Rad(x, false); }, -kTwoPi, kTwoPi},
   };
-  for (const Reducer& r : reducers) {
+  for (const auto& r : reducers) {
     for (double x : {kNaN, kInf, -kInf}) EXPECT_TRUE(std::isnan(r.fn(x))) << r.name << " " << x;
     for (double x : {1e300, -1e300, 1e17, -0.0, 4e-320}) {
       const double y = r.fn(x);
-      EXPECT_GE(y, r.lo) << r.name << " " << x;
-      EXPECT_LE(y, r.hi) << r.name << " " << x;
+      EXPECT_TRUE(y >= r.lo && y <= r.hi) << r.name << " " << x << " gives " << y;
     }
   }
 }
 
-TEST(DegreeReductions, ModDeg360AndModDeg180) {
+TEST(DegreeReductions, ModDeg360ModDeg180AndOneCorrectionDifferences) {
   EXPECT_EQ(ModDeg360(-30, true), 330);
   EXPECT_EQ(ModDeg360(-30, false), -30);
-  EXPECT_EQ(ModDeg360(725, true), 5);
   EXPECT_TRUE(std::signbit(ModDeg360(-0.0, true)));
   EXPECT_EQ(ModDeg180(190, false), -170);
   EXPECT_EQ(ModDeg180(-180, false), 180);
-  EXPECT_EQ(ModDeg180(180, false), 180);
   EXPECT_EQ(ModDeg180(-10, true), 170);
   EXPECT_EQ(pos360(-0.5), 359.5);
   EXPECT_EQ(pos360(720), 0);
+  // One correction only: 720 stays a full turn.
+  const double diffs[][3] = {{350, 10, -20}, {10, 350, 20}, {-180, 0, 180}, {720, 0, 360}};
+  for (const auto& d : diffs) {
+    EXPECT_DOUBLE_EQ(AngleDiff(d[0], d[1]), d[2]);
+    EXPECT_DOUBLE_EQ(MinimizeTurnAngle(d[0] - d[1]), d[2]);
+  }
 }
-
-struct DiffCase {
-  double a, b, expected;
-};
-
-class AngleDifference : public ::testing::TestWithParam<DiffCase> {};
-
-TEST_P(AngleDifference, AppliesOneCorrection) {
-  const DiffCase& c = GetParam();
-  EXPECT_DOUBLE_EQ(AngleDiff(c.a, c.b), c.expected);
-  EXPECT_DOUBLE_EQ(MinimizeTurnAngle(c.a - c.b), c.expected);
-}
-
-INSTANTIATE_TEST_SUITE_P(Cases, AngleDifference,
-                         ::testing::Values(DiffCase{350, 10, -20}, DiffCase{10, 350, 20}, DiffCase{180, 0, 180},
-                                           DiffCase{-180, 0, 180}, DiffCase{720, 0, 360},
-                                           DiffCase{0, 0, 0}));
 
 TEST(InstrumentReadings, FacesAndCirclesAreInvolutions) {
   for (double h : {0.0, 1e-13, 10.0, 90.0, 180.0, 359.5}) {
@@ -189,7 +127,7 @@ TEST(InstrumentReadings, FacesAndCirclesAreInvolutions) {
   EXPECT_EQ(v, 80);
 }
 
-TEST(AngleUnits, RoundTripsWithoutReduction) {
+TEST(AngleUnits, RoundTripsAndReductions) {
   for (double d : {-725.5, -90.0, 0.0, 12.3456, 359.999, 1000.0}) {
     EXPECT_NEAR(Rad2Deg(Deg2Rad(d, true), true), d, 1e-11) << d;
     EXPECT_NEAR(Grad2Deg(Deg2Grad(d, true), true), d, 1e-11) << d;
@@ -201,37 +139,26 @@ TEST(AngleUnits, RoundTripsWithoutReduction) {
   EXPECT_NEAR(Deg2Mil(360, true), 6400, 1e-9);
   EXPECT_NEAR(DegSec2GradCC(3240, false), 10000, 1e-9);
   EXPECT_NEAR(GradCC2DegSec(DegSec2GradCC(1234.5, true)), 1234.5, 1e-9);
-}
-
-TEST(AngleUnits, ReductionKeepsTheSign) {
-  EXPECT_NEAR(Deg2Rad(370, false), Deg2Rad(10, true), 1e-15);
+  // Reduction keeps the sign.
   EXPECT_NEAR(Deg2Rad(-370, false), Deg2Rad(-10, true), 1e-15);
   EXPECT_NEAR(Rad2Deg(3 * kPi, false), 180, 1e-9);
   EXPECT_NEAR(Grad2Deg(500, false), 90, 1e-12);
   EXPECT_NEAR(Mil2Deg(-7000, false), -33.75, 1e-9);
-}
-
-TEST(Atan3, ZeroVectorGivesZero) {
-  EXPECT_EQ(atan3(0, 0), 0);
+  // atan3 gives zero for a (nearly) zero vector.
   EXPECT_EQ(atan3(1e-13, -1e-13), 0);
-  EXPECT_DOUBLE_EQ(atan3(1, 0), kPi / 2);
   EXPECT_DOUBLE_EQ(atan3(0, -1), kPi);
 }
 
-TEST(Sexagesimal, DmsToDegreesTakesTheSignFromAnyField) {
-  EXPECT_DOUBLE_EQ(dms_to_deg(12, 30, 36), 12.51);
+// dms_to_deg takes the sign from any field; deg_to_dms puts it on the first non-zero field and reads back.
+TEST(Sexagesimal, DegreesToDmsAndBack) {
   EXPECT_DOUBLE_EQ(dms_to_deg(-12, 30, 36), -12.51);
   EXPECT_DOUBLE_EQ(dms_to_deg(0, -30, 0), -0.5);
   EXPECT_DOUBLE_EQ(dms_to_deg(0, 0, -36), -0.01);
-}
-
-TEST(Sexagesimal, DegreesToDmsAndBack) {
-  for (double x : {0.0, 0.5, -0.5, -0.01, 12.51, -12.51, 123.456789, 359.75, -89.999}) {
-    double d = 0, m = 0, s = 0;
+  double d = 0, m = 0, s = 0;
+  for (double x : {0.0, 0.5, -0.5, 12.51, -12.51, 123.456789, 359.75, -89.999}) {
     deg_to_dms(x, &d, &m, &s);
     EXPECT_NEAR(dms_to_deg(d, m, s), x, 1e-10) << x;
   }
-  double d = 0, m = 0, s = 0;
   deg_to_dms(-0.01, &d, &m, &s);
   EXPECT_EQ(d, 0);
   EXPECT_EQ(m, 0);
@@ -242,26 +169,16 @@ TEST(Sexagesimal, DegreesToDmsAndBack) {
   EXPECT_EQ(m, 60);
 }
 
-struct PackedCase {
-  double packed, degrees;
-};
-
-class PackedDms : public ::testing::TestWithParam<PackedCase> {};
-
-TEST_P(PackedDms, UnpacksWithCarries) {
-  const PackedCase& c = GetParam();
-  EXPECT_NEAR(DDDMMSS2Deg(c.packed), c.degrees, 1e-12) << c.packed;
+// Packed DDD.MMSS unpacks with carries out of 60 seconds and 60 minutes, and reduces the degrees.
+TEST(PackedDms, UnpacksWithCarries) {
+  const double cases[][2] = {{12.3030, 12.0 + 30.0 / 60 + 30.0 / 3600}, {-12.3030, -(12.0 + 30.0 / 60 + 30.0 / 3600)},
+                             {12.3060, 12.0 + 31.0 / 60}, {12.30999999999, 12.0 + 31.0 / 60}, {0.5960, 1.0},
+                             {370.3000, 10.5},            {0.0001, 1.0 / 3600}};
+  for (const auto& c : cases) EXPECT_NEAR(DDDMMSS2Deg(c[0]), c[1], 1e-12) << c[0];
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Cases, PackedDms,
-    ::testing::Values(PackedCase{12.3030, 12.0 + 30.0 / 60 + 30.0 / 3600}, PackedCase{12.3060, 12.0 + 31.0 / 60},
-                      PackedCase{-12.3030, -(12.0 + 30.0 / 60 + 30.0 / 3600)},
-                      PackedCase{12.30999999999, 12.0 + 31.0 / 60}, PackedCase{0.5960, 1.0},
-                      PackedCase{370.3000, 10.5}, PackedCase{0.0001, 1.0 / 3600}));
-
 TEST(PackedDms, DegreesToPackedAndBack) {
-  for (double x : {0.0, 1.0 / 3600, 12.508333333333333, -45.25, 89.99, 123.456789, 359.5, -0.75}) {
+  for (double x : {0.0, 1.0 / 3600, 12.508333333333333, -45.25, 123.456789, -0.75}) {
     for (int prec : {4, 6, 8}) {
       const double packed = Deg2DDDMMSS(x, prec, false);
       const double tolerance = 0.51 * std::pow(10.0, 4 - prec) / 3600.0;
@@ -271,6 +188,10 @@ TEST(PackedDms, DegreesToPackedAndBack) {
   EXPECT_DOUBLE_EQ(Deg2DDDMMSS(12.9999999, 4, false), 13.0);
   EXPECT_NEAR(Deg2DDDMMSS(370.5, 4, false), 10.3, 1e-12);
   EXPECT_NEAR(Deg2DDDMMSS(370.5, 4, true), 370.3, 1e-12);
+  // Degrees and decimal minutes: reduced, and rounded minutes may reach 60.
+  EXPECT_NEAR(Deg2DDMMDEC(-12.51, 3, false), -12.306, 1e-12);
+  EXPECT_NEAR(Deg2DDMMDEC(370.25, 2, false), 10.15, 1e-12);
+  EXPECT_NEAR(Deg2DDMMDEC(59.99999, 2, false), 60.0, 1e-12);
 }
 
 TEST(PackedDms, SplitNeverReachesSixty) {
@@ -297,13 +218,6 @@ TEST(PackedDms, SplitNeverReachesSixty) {
   EXPECT_TRUE(std::isnan(s));
 }
 
-TEST(PackedDms, DegreesAndDecimalMinutes) {
-  EXPECT_NEAR(Deg2DDMMDEC(12.5, 3, false), 12.30, 1e-12);
-  EXPECT_NEAR(Deg2DDMMDEC(-12.51, 3, false), -12.306, 1e-12);
-  EXPECT_NEAR(Deg2DDMMDEC(370.25, 2, false), 10.15, 1e-12);
-  EXPECT_NEAR(Deg2DDMMDEC(59.99999, 2, false), 60.0, 1e-12);
-}
-
 TEST(PackedDms, BadPrecisionIsLogged) {
   svy_logging::CScopedErrLogCapture capture;
   Deg2DDDMMSS(1.0, 3, false);
@@ -315,39 +229,30 @@ TEST(PackedDms, BadPrecisionIsLogged) {
   EXPECT_EQ(capture.count(), before);
 }
 
-struct TextCase {
-  double packed;
-  int prec;
-  const wchar_t* text;
-};
-
-class PackedDmsText : public ::testing::TestWithParam<TextCase> {};
-
-TEST_P(PackedDmsText, FormatsDegreesMinutesSeconds) {
-  const TextCase& c = GetParam();
-  EXPECT_EQ(std::wstring(DDDMMSS2String(c.packed, c.prec).c_str()), std::wstring(c.text));
+TEST(PackedDmsText, FormatsDegreesMinutesSeconds) {
+  struct {
+    double packed;
+    int prec;
+    const wchar_t* text;
+  } const cases[] = {{12.0502, 1, L"12\u00B05'2.0\""},  {-12.3030, 0, L"-12\u00B030'30\""},
+                     {-0.3000, 0, L"0\u00B030'0\""},    // the sign rides on the degrees: lost between -1 and 0
+                     {12.595999, 0, L"13\u00B00'0\""},  // rounded seconds carry into minutes and degrees
+                     {12.3060, 0, L"12\u00B031'0\""}};
+  for (const auto& c : cases) EXPECT_EQ(std::wstring(DDDMMSS2String(c.packed, c.prec).c_str()), c.text) << c.packed;
 }
 
-INSTANTIATE_TEST_SUITE_P(Cases, PackedDmsText,
-                         ::testing::Values(TextCase{12.3030, 0, L"12\u00B030'30\""},
-                                           TextCase{12.0502, 1, L"12\u00B05'2.0\""},
-                                           TextCase{-12.3030, 0, L"-12\u00B030'30\""},
-                                           // The sign rides on the degrees: lost between -1 and 0.
-                                           TextCase{-0.3000, 0, L"0\u00B030'0\""},
-                                           // Rounded seconds carry into minutes and degrees.
-                                           TextCase{12.595999, 0, L"13\u00B00'0\""},
-                                           TextCase{12.3060, 0, L"12\u00B031'0\""}));
-
+// Three text fields to radians; the sign comes from the degrees (minus zero is an int zero: positive);
+// a field that is no whole number gives 0.
 TEST(AngleText, ParsesThreeFieldsToRadians) {
   using svy_text::CSvyString;
-  EXPECT_NEAR(AngleToRad(CSvyString(L"12"), CSvyString(L"30"), CSvyString(L"36")), 12.51 * kPi / 180, 1e-15);
-  EXPECT_NEAR(AngleToRad(CSvyString(L"-12"), CSvyString(L"30"), CSvyString(L"36")), -12.51 * kPi / 180, 1e-15);
-  // Minus zero degrees is an int zero: the angle is positive.
-  EXPECT_NEAR(AngleToRad(CSvyString(L"-0"), CSvyString(L"30"), CSvyString(L"0")), 0.5 * kPi / 180, 1e-15);
-  EXPECT_NEAR(AngleToRad(CSvyString(L"370"), CSvyString(L"0"), CSvyString(L"0")), 10 * kPi / 180, 1e-15);
-  EXPECT_EQ(AngleToRad(CSvyString(L"12x"), CSvyString(L"30"), CSvyString(L"0")), 0);
-  EXPECT_EQ(AngleToRad(CSvyString(L"12"), CSvyString(L""), CSvyString(L"0")), 0);
-  EXPECT_EQ(AngleToRad(CSvyString(L"12"), CSvyString(L"1"), CSvyString(L"abc")), 0);
+  struct {
+    const wchar_t *d, *m, *s;
+    double degrees;
+  } const cases[] = {{L"12", L"30", L"36", 12.51}, {L"-12", L"30", L"36", -12.51}, {L"-0", L"30", L"0", 0.5},
+                     {L"370", L"0", L"0", 10},     {L"12x", L"30", L"0", 0},        {L"12", L"", L"0", 0},
+                     {L"12", L"1", L"abc", 0}};
+  for (const auto& c : cases)
+    EXPECT_NEAR(AngleToRad(CSvyString(c.d), CSvyString(c.m), CSvyString(c.s)), c.degrees * kPi / 180, 1e-15) << c.degrees;
 }
 
 TEST(AngleText, NegativeMinutesOrSecondsAreLoggedAndUsed) {

@@ -215,14 +215,4 @@ TEST(ArcFailures, LeaveTheRecordUnchanged) {
   EXPECT_FALSE(empty.get_middle_pos_on_the_arc(p));
 }
 
-TEST(ArcCalculator, HoldsOneArc) {
-  CArc arc;
-  ASSERT_TRUE(arc.set_center_R(C2dPos(1, 1), 2));
-  CArcCalculator calc;
-  calc.setArc(arc);
-  EXPECT_EQ(calc.getArc().center, arc.center);
-  calc.getArc().clockwise = false;
-  EXPECT_FALSE(calc.getArc().clockwise);
-}
-
 }  // namespace
