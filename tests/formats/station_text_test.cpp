@@ -2,11 +2,11 @@
 
 #include <gtest/gtest.h>
 
-#include <climits>
-#include <clocale>
 #include <cmath>
 #include <limits>
 #include <string>
+
+#include "support/comma_locale.h"
 
 namespace {
 
@@ -82,25 +82,11 @@ TEST(StationTextRoundTrip, WrittenTextReadsBackToTheStation) {
 }
 
 TEST(StationText, IndependentOfAHostDecimalComma) {
-  const char* candidates[] = {"de_DE.UTF-8", "de_DE.utf8", "fr_FR.UTF-8", "de_DE"};
-  const std::string previous = std::setlocale(LC_ALL, nullptr);
-  bool found = false;
-  for (const char* name : candidates) {
-    if (std::setlocale(LC_ALL, name) != nullptr && std::localeconv()->decimal_point[0] == ',') {
-      found = true;
-      break;
-    }
-  }
-  if (!found) {
-    std::setlocale(LC_ALL, previous.c_str());
-    GTEST_SKIP() << "no decimal-comma C locale installed";
-  }
-  const std::wstring text = StnToString(1234.567, 1000).str();
+  const svy_test::CDecimalCommaCLocale comma;
+  if (!comma.active()) GTEST_SKIP() << "no decimal-comma C locale installed";
+  EXPECT_EQ(StnToString(1234.567, 1000).str(), L"1+234.57");
   double station = 0.0;
-  const int result = StnFromString(CSvyString(L"1+234.5"), station, 1000);
-  std::setlocale(LC_ALL, previous.c_str());
-  EXPECT_EQ(text, L"1+234.57");
-  EXPECT_EQ(result, 1);
+  EXPECT_EQ(StnFromString(CSvyString(L"1+234.5"), station, 1000), 1);
   EXPECT_EQ(station, 1234.5);
 }
 

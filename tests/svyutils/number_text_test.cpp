@@ -10,6 +10,7 @@
 #include <string>
 #include <utility>
 
+#include "support/comma_locale.h"
 #include "svyutils/round_prec.h"
 #include "svyutils/svy_number_text.h"
 #include "svyutils/svy_string.h"
@@ -156,21 +157,9 @@ TEST_F(CommaLocaleHost, StreamsOfTheHostUseTheComma) {
 }
 
 TEST_F(CommaLocaleHost, CRuntimeLocaleWithDecimalComma) {
-  const char* candidates[] = {"de_DE.UTF-8", "de_DE.utf8", "fr_FR.UTF-8", "de_DE", "German_Germany.1252"};
-  const std::string previous = std::setlocale(LC_ALL, nullptr);
-  const char* chosen = nullptr;
-  for (const char* name : candidates) {
-    if (std::setlocale(LC_ALL, name) != nullptr && std::localeconv()->decimal_point[0] == ',') {
-      chosen = name;
-      break;
-    }
-  }
-  if (chosen == nullptr) {
-    std::setlocale(LC_ALL, previous.c_str());
-    GTEST_SKIP() << "no decimal-comma C locale installed";
-  }
+  const svy_test::CDecimalCommaCLocale comma;
+  if (!comma.active()) GTEST_SKIP() << "no decimal-comma C locale installed";
   expectCLocaleText();
-  std::setlocale(LC_ALL, previous.c_str());
 }
 
 TEST(ScopedCLocale, RestoresTheThreadLocale) {
