@@ -148,10 +148,10 @@ class CommaLocaleHost : public ::testing::Test {
   std::locale previousGlobal_;
 };
 
+// The fixture's C++ locale is in force (so the checks are meaningful), and GetCLocale still formats with
+// the point, and so does the library.
 TEST_F(CommaLocaleHost, StreamsOfTheHostUseTheComma) {
-  // The fixture's locale is in force (so the next test is meaningful) ...
   EXPECT_EQ(std::use_facet<std::numpunct<char>>(std::locale()).decimal_point(), ',');
-  // ... and GetCLocale still formats with the point.
   EXPECT_EQ(std::use_facet<std::numpunct<char>>(svy_formats::GetCLocale()).decimal_point(), '.');
   expectCLocaleText();
 }

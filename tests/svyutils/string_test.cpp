@@ -70,29 +70,19 @@ TEST(SvyStringEditing, TrimsReplacesInsertsAndDeletes) {
   EXPECT_EQ(CSvyString(L"   ").Trim().str(), L"");
   EXPECT_EQ(CSvyString(L"xxabxx").TrimLeft(L'x').TrimRight(L"x").str(), L"ab");
 
-  EXPECT_EQ(text.Replace(L',', L'.'), 1);
+  // Results in the order of the edits (a braced list is evaluated left to right). A replacement that
+  // contains the searched text must not be searched again; positions outside the text are clamped.
+  CSvyString grow(L"a-a-a"), edit(L"1234");
+  const int results[][2] = {{text.Replace(L',', L'.'), 1},  {grow.Replace(L"a", L"aa"), 3},
+                            {grow.Replace(L"aa", nullptr), 3}, {grow.Replace(L"", L"x"), 0},
+                            {edit.Insert(1, L'+'), 5},       {edit.Insert(99, L".00"), 8},
+                            {edit.Insert(-5, L"-"), 9},      {edit.Delete(0), 8},
+                            {edit.Delete(5, 99), 5},         {edit.Delete(99, 1), 5},
+                            {edit.Delete(-1, 1), 5},         {edit.Remove(L'+'), 1}};
+  for (const auto& r : results) EXPECT_EQ(r[0], r[1]) << (&r - results);
   EXPECT_EQ(text.str(), L"1.5");
-  // A replacement that contains the searched text must not be searched again.
-  CSvyString grow(L"a-a-a");
-  EXPECT_EQ(grow.Replace(L"a", L"aa"), 3);
-  EXPECT_EQ(grow.str(), L"aa-aa-aa");
-  EXPECT_EQ(grow.Replace(L"aa", nullptr), 3);
   EXPECT_EQ(grow.str(), L"--");
-  EXPECT_EQ(grow.Replace(L"", L"x"), 0);
-
-  CSvyString edit(L"1234");
-  EXPECT_EQ(edit.Insert(1, L'+'), 5);
-  EXPECT_EQ(edit.Insert(99, L".00"), 8);
-  EXPECT_EQ(edit.Insert(-5, L"-"), 9);
-  EXPECT_EQ(edit.str(), L"-1+234.00");
-  EXPECT_EQ(edit.Delete(0), 8);
-  EXPECT_EQ(edit.Delete(5, 99), 5);
-  EXPECT_EQ(edit.Delete(99, 1), 5);
-  EXPECT_EQ(edit.Delete(-1, 1), 5);
-  EXPECT_EQ(edit.str(), L"1+234");
-  EXPECT_EQ(edit.Remove(L'+'), 1);
   EXPECT_EQ(edit.str(), L"1234");
-
   edit.SetAt(0, L'9');
   edit.SetAt(4, L'x');
   edit.SetAt(-1, L'x');
@@ -140,33 +130,26 @@ TEST(SvyStringBuffer, WritesThroughAndSetsTheLength) {
   EXPECT_EQ(text.str(), L"12");
 }
 
-TEST(SvyStringFormat, PrintfConversionsWithWideStrings) {
-  struct {
-    CSvyString actual;
-    const wchar_t* expected;
-  } cases[] = {{{}, L"1+234.57"}, {{}, L"[  abc|x|nar]"}, {{}, L"100% -7 0x1f"}, {{}, L"5.30e+00"}};
-  cases[0].actual.Format(L"%d+%.2f", 1, 234.567);
-  cases[1].actual.Format(L"[%5s|%c|%hs]", L"abc", L'x', "nar");
-  cases[2].actual.Format(L"%d%% %ld %#x", 100, -7L, 31U);
-  cases[3].actual.Format(L"%.2e", 5.3);
-  for (const auto& c : cases) EXPECT_EQ(c.actual.str(), c.expected);
-
+// printf conversions with wide strings, positional arguments, growth for long output; a narrow byte beyond
+// ASCII has no meaning in the C locale: the text is empty, quickly.
+TEST(SvyStringFormat, PrintfConversionsPositionalArgumentsAndLongOutput) {
+  const auto format = [](const wchar_t* spec, auto... args) {
+    CSvyString text(L"old");
+    text.Format(spec, args...);
+    return text.str();
+  };
+  const std::wstring longText(5000, L'z');
+  const std::pair<std::wstring, std::wstring> cases[] = {
+      {format(L"%d+%.2f", 1, 234.567), L"1+234.57"},
+      {format(L"[%5s|%c|%hs]", L"abc", L'x', "nar"), L"[  abc|x|nar]"},
+      {format(L"%d%% %ld %#x %.2e", 100, -7L, 31U, 5.3), L"100% -7 0x1f 5.30e+00"},
+      {format(L"%2$s=%1$d", 7, L"k"), L"k=7"},
+      {format(L"%hs", "\xC3\xA9"), L""},
+      {format(L"<%ls>%d", longText.c_str(), 42), L"<" + longText + L">42"}};
+  for (const auto& c : cases) EXPECT_EQ(c.first, c.second) << (&c - cases);
   CSvyString appended(L"N=");
   appended.AppendFormat(L"%.3f", 12.0);
   EXPECT_EQ(appended.str(), L"N=12.000");
-}
-
-TEST(SvyStringFormat, PositionalArgumentsAndUnconvertibleNarrowText) {
-  CSvyString text;
-  text.Format(L"%2$s=%1$d", 7, L"k");
-  EXPECT_EQ(text.str(), L"k=7");
-  // A narrow byte beyond ASCII has no meaning in the C locale: the text is empty, quickly.
-  text.Format(L"%hs", "\xC3\xA9");
-  EXPECT_TRUE(text.IsEmpty());
-  // Long output grows the buffer.
-  const std::wstring longText(5000, L'z');
-  text.Format(L"<%ls>%d", longText.c_str(), 42);
-  EXPECT_EQ(text.str(), L"<" + longText + L">42");
 }
 
 TEST(SvyStringOperators, ConcatenateAndCompare) {
