@@ -6,11 +6,10 @@
 #include <cmath>
 #include <string>
 
+#include "curve_test_support.h"
 #include "support/refdata.h"
 #include "svymath/curves/curve_arc.h"
 #include "svyutils/svy_err_log.h"
-#include "test_generic_support.h"
-#include "test_spiral_support.h"
 
 namespace {
 
@@ -98,55 +97,6 @@ INSTANTIATE_TEST_SUITE_P(Table, ArcStepTest,
                                            StepCase{1000.0, 500.0, 495.0, 0.01, 5.0},  // not past the end
                                            StepCase{50.0, 20.0, 3.0, 0.0, 17.0},       // no deviation: the rest
                                            StepCase{1000.0, 500.0, 500.0005, 0.01, 0.0}));
-
-// Walking an arc by deviation steps reaches its end, and every chord stays within the deviation of the arc.
-TEST(ArcElement, DeviationStepsWalkToTheEndWithinTheDeviation) {
-  const CCurveArc arc = makeArc(300.0, 400.0, 200.0, 180.0, 250.0, false);
-  double s = 0.0;
-  C2dPos previous = arc.getStartPos();
-  int steps = 0;
-  while (s < arc.getTotalLength() && steps < 1000) {
-    C2dPos next;
-    const double reached = arc.getNextPosForDeviation(s, 0.02, next);
-    ASSERT_GT(reached, s);
-    // Sagitta of the chord: distance from its midpoint to the arc point halfway along.
-    C2dPos halfway;
-    ASSERT_TRUE(arc.getPosAtLength(0.5 * (s + reached), halfway));
-    const double sagitta = std::hypot(0.5 * (previous.north() + next.north()) - halfway.north(),
-                                      0.5 * (previous.east() + next.east()) - halfway.east());
-    EXPECT_LE(sagitta, 0.02 + 1e-9);
-    s = reached;
-    previous = next;
-    ++steps;
-  }
-  EXPECT_NEAR(s, 180.0, 1e-12);
-  EXPECT_EQ(previous, arc.getEndPos());
-  EXPECT_EQ(steps, static_cast<int>(std::ceil(180.0 / (500.0 * std::acos(1.0 - 0.02 / 250.0)))));
-}
-
-TEST(ArcData, StepOutsideTheArcIsZeroAndLogged) {
-  CCurveDataArc data;
-  ASSERT_TRUE(data.SetElement(100.0, 50.0, true));
-  svy_logging::CScopedErrLogCapture capture;
-  EXPECT_EQ(data.getStepForDeviation(100.002, 0.01), 0.0);
-  EXPECT_EQ(capture.count(), 1u);
-}
-
-TEST(ArcElement, PositionSnapsWithinAMillimetreOfTheEnd) {
-  const CCurveArc arc = makeArc(0.0, 0.0, 0.0, 100.0, 300.0, true);
-  C2dPos end;
-  C2dPos pos;
-  ASSERT_TRUE(arc.getPosAtLength(100.0, end));
-  svy_logging::CScopedErrLogCapture capture;
-  ASSERT_TRUE(arc.getPosAtLength(100.0009, pos));
-  EXPECT_EQ(pos, end);
-  EXPECT_EQ(capture.count(), 0u);
-  pos = C2dPos(-1.0, -1.0);
-  EXPECT_FALSE(arc.getPosAtLength(100.0011, pos));
-  EXPECT_EQ(pos, C2dPos(-1.0, -1.0));
-  ASSERT_EQ(capture.count(), 1u);
-  EXPECT_EQ(capture.entries()[0].file, "mathCurves");
-}
 
 // Closed-form oracle of the placed arc: centre on the right for a right turn, points at R from it.
 TEST(ArcElement, PositionsLieOnTheCircleAboutTheStatedCentre) {
@@ -335,7 +285,7 @@ TEST(ArcElement, MatchesPublishedArcTables) {
   for (const double ifcRadius : {300.0, -300.0, 1000.0, -1000.0}) {
     const std::string name = "Horizontal_CircularArc_100.0_" + std::to_string(static_cast<int>(ifcRadius)) + "_" +
                              std::to_string(static_cast<int>(ifcRadius)) + "_Meter.csv";
-    const auto rows = spiral_test::readNumericTable(svy_test::refdataPath(folder + name));
+    const auto rows = curve_test::readNumericTable(svy_test::refdataPath(folder + name));
     ASSERT_GT(rows.size(), 10u) << name;
     const CCurveArc arc = makeArc(0.0, 0.0, 90.0, 100.0, std::fabs(ifcRadius), ifcRadius < 0.0);
     for (const auto& row : rows) {

@@ -1,11 +1,9 @@
-// Tangent data and the tangent element: the two ways of definition, the length range rule with its log
-// entries, placement by origin and azimuth, projection and the tangent element's line mathematics.
+// Tangent data and the tangent element: the two ways of definition, placement by origin and azimuth, projection and the tangent element's line mathematics.
 #include <gtest/gtest.h>
 
 #include <cmath>
 
-#include "svyutils/svy_err_log.h"
-#include "test_generic_support.h"
+#include "curve_test_support.h"
 
 namespace {
 
@@ -32,25 +30,6 @@ TEST(SegmentData, EndPointAndLengthWithAzimuthAgree) {
   EXPECT_FALSE(byLength.setLen(-1.0));
   EXPECT_EQ(CCurveDataSegment::static_type(), 0);
   EXPECT_EQ(CCurveDataArc::static_type(), 1);
-}
-
-TEST(SegmentData, UndefinedOrOutOfRangeLengthsFailWithALogEntry) {
-  CCurveDataSegment data;
-  double north = 5.0;
-  double east = 6.0;
-  svy_logging::CScopedErrLogCapture capture;
-  EXPECT_FALSE(data.getPosAtLength(0.0, north, east));  // undefined
-  ASSERT_TRUE(data.setLen(20.0));
-  EXPECT_FALSE(data.getPosAtLength(1.0, north, east));  // length without azimuth
-  data.setAzDeg(90.0);
-  EXPECT_TRUE(data.getPosAtLength(20.0009, north, east));
-  EXPECT_NEAR(east, 20.0, 1e-12);
-  EXPECT_FALSE(data.getPosAtLength(20.0011, north, east));
-  EXPECT_FALSE(data.getPosAtLength(-0.0011, north, east));
-  EXPECT_TRUE(data.getPosAtLength(-0.0009, north, east));
-  EXPECT_EQ(north, 0.0);
-  ASSERT_EQ(capture.count(), 4u);
-  for (const auto& entry : capture.entries()) EXPECT_EQ(entry.file, "mathCurves");
 }
 
 TEST(SegmentElement, PlacedByOriginAndAzimuth) {

@@ -5,9 +5,8 @@
 #include <cmath>
 #include <string>
 
+#include "curve_test_support.h"
 #include "support/refdata.h"
-#include "test_generic_support.h"
-#include "test_spiral_support.h"
 
 namespace {
 
@@ -131,23 +130,6 @@ INSTANTIATE_TEST_SUITE_P(
                       SpiralCase{"partialLeftCSST", eMathSpiralEuler, 100.0, 300.0, 1000.0, false, false}),
     [](const ::testing::TestParamInfo<SpiralCase>& caseInfo) { return std::string(caseInfo.param.name); });
 
-TEST(SpiralElement, CurveToTangentStartsWithTheCurveAndEndsStraight) {
-  const CCurveSpiral spiral = makeSpiral(10.0, 20.0, 45.0, 80.0, 200.0, true, false);
-  C2dPos start;
-  ASSERT_TRUE(spiral.getPosAtLength(0.0, start));
-  EXPECT_NEAR(start.north(), 10.0, 1e-12);
-  EXPECT_NEAR(start.east(), 20.0, 1e-12);
-  EXPECT_NEAR(spiral.getCurvatureAtLength(0.0), 1.0 / 200.0, 1e-12);
-  EXPECT_NEAR(spiral.getCurvatureAtLength(80.0), 0.0, 1e-12);
-  EXPECT_NEAR(spiral.getAzimuthAtLength(0.0), 45.0, 1e-12);
-  EXPECT_NEAR(spiral.getStartRadius(), 200.0, 1e-9);
-  EXPECT_EQ(spiral.getEndRadius(), 0.0);
-  EXPECT_TRUE(spiral.isToTheRight());
-  const CCurveSpiral left = makeSpiral(10.0, 20.0, 45.0, 80.0, 200.0, false, true);
-  EXPECT_FALSE(left.isToTheRight());
-  EXPECT_NEAR(left.getSpiralParam(), std::sqrt(200.0 * 80.0), 1e-9);
-}
-
 TEST(SpiralElement, PointsBeyondTheEndsRunOnAlongTheEndTangents) {
   CCurveSpiral spiral = makeSpiral(0.0, 0.0, 0.0, 100.0, 300.0, true, true);
   CMathAngle endTangent;
@@ -193,7 +175,6 @@ TEST(SpiralElement, CurveIpOfFullSpiralAtLongTangent) {
   EXPECT_NEAR(ip.north(), end.north() - end.east() / std::tan(theta), 1e-9);
 }
 
-
 // Published clothoid tables (start at the origin heading +X, radius positive to the LEFT, X east, Y north),
 // full and partial, into and out of the curve: N = Y, E = X, start azimuth 90 degrees, side negated. Each
 // row's position must come back within the table's own accuracy, and its length and offset by the search.
@@ -213,7 +194,7 @@ TEST(SpiralElement, MatchesPublishedClothoidTables) {
                           {"-1000", "-300", 1000.0, 300.0, false}, {"-300", "-1000", 300.0, 1000.0, false}};
   for (const Table& t : tables) {
     const std::string name = std::string("Horizontal_Clothoid_100.0_") + t.r1 + "_" + t.r2 + "_Meter.csv";
-    const auto rows = spiral_test::readNumericTable(svy_test::refdataPath(folder + name));
+    const auto rows = curve_test::readNumericTable(svy_test::refdataPath(folder + name));
     ASSERT_GT(rows.size(), 10u) << name;
     const bool intoCurve = t.from == 0.0 || (t.to != 0.0 && t.to < t.from);
     const CCurveSpiral spiral =

@@ -5,10 +5,10 @@
 #include <cmath>
 #include <limits>
 
+#include "curve_test_support.h"
 #include "support/refdata.h"
 #include "svymath/curves/spiral_fresnel.h"
 #include "svymath/foundation/constants.h"
-#include "test_spiral_support.h"
 
 namespace {
 
@@ -27,8 +27,8 @@ class FresnelQuadrature : public ::testing::TestWithParam<double> {};
 
 TEST_P(FresnelQuadrature, MatchesAdaptiveSimpson) {
   const double t = GetParam();
-  const double c = spiral_test::integrate([](double u) { return std::cos(kPi * u * u / 2.0); }, 0.0, t, 1e-13);
-  const double s = spiral_test::integrate([](double u) { return std::sin(kPi * u * u / 2.0); }, 0.0, t, 1e-13);
+  const double c = curve_test::integrate([](double u) { return std::cos(kPi * u * u / 2.0); }, 0.0, t, 1e-13);
+  const double s = curve_test::integrate([](double u) { return std::sin(kPi * u * u / 2.0); }, 0.0, t, 1e-13);
   double S = 0.0;
   double C = 0.0;
   fresnelCS(t, S, C);
@@ -41,7 +41,7 @@ INSTANTIATE_TEST_SUITE_P(BothRegimes, FresnelQuadrature,
                                            2.5, 3.3, 4.0, 5.5, -0.6, -1.5, -2.2));
 
 TEST(FresnelTable, MatchesTwentyDigitValues) {
-  const auto rows = spiral_test::readNumericTable(svy_test::testdataPath("curves/fresnel_CS_table.csv"));
+  const auto rows = curve_test::readNumericTable(svy_test::testdataPath("curves/fresnel_CS_table.csv"));
   ASSERT_GT(rows.size(), 150u);
   int belowSwitch = 0;
   int aboveSwitch = 0;
@@ -60,7 +60,7 @@ TEST(FresnelTable, MatchesTwentyDigitValues) {
   EXPECT_GT(aboveSwitch, 0);
 }
 
-TEST(FresnelSymmetry, OddFunctionsWithHalfLimits) {
+TEST(FresnelSymmetry, OddFunctionsWithHalfLimitsContinuousAtTheSwitch) {
   for (double t : {0.2, 1.4999, 1.5, 3.0, 40.0}) {
     double S1 = 0.0, C1 = 0.0, S2 = 0.0, C2 = 0.0;
     fresnelCS(t, S1, C1);
@@ -81,16 +81,12 @@ TEST(FresnelSymmetry, OddFunctionsWithHalfLimits) {
   fresnelCS(std::nan(""), S, C);
   EXPECT_TRUE(std::isnan(S));
   EXPECT_TRUE(std::isnan(C));
-}
-
-TEST(FresnelSwitch, ContinuousAcrossRegimes) {
-  // The two regimes must meet: values straddling 1.5 differ by the derivative times the gap only.
-  const double below = std::nextafter(1.5, 0.0);
-  double Sb = 0.0, Cb = 0.0, Sa = 0.0, Ca = 0.0;
-  fresnelCS(below, Sb, Cb);
-  fresnelCS(1.5, Sa, Ca);
-  EXPECT_NEAR(Cb, Ca, 5e-12);
-  EXPECT_NEAR(Sb, Sa, 5e-12);
+  // The power series and the continued fraction meet at 1.5: neighbours differ by the derivative times the gap.
+  double Sb = 0.0, Cb = 0.0;
+  fresnelCS(std::nextafter(1.5, 0.0), Sb, Cb);
+  fresnelCS(1.5, S, C);
+  EXPECT_NEAR(Cb, C, 5e-12);
+  EXPECT_NEAR(Sb, S, 5e-12);
 }
 
 }  // namespace

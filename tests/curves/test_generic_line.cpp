@@ -4,8 +4,8 @@
 
 #include <cmath>
 
+#include "curve_test_support.h"
 #include "svymath/curves/generic_line_impl.h"
-#include "test_generic_support.h"
 
 namespace {
 

@@ -6,10 +6,10 @@
 #include <algorithm>
 #include <cmath>
 
+#include "curve_test_support.h"
 #include "svymath/curves/generic_line_impl.h"
 #include "svymath/curves/generic_segment_visitor.h"
 #include "svymath/curves/tline.h"
-#include "test_generic_support.h"
 
 namespace {
 
@@ -238,19 +238,6 @@ TEST(SpiralIntersection, SpiralWithArcAndSpiralWithSpiral) {
     EXPECT_LT(std::fabs(p.east()), 1e-4);
     EXPECT_LT(p.north(), 5.0);  // within the first approximating arc
   }
-}
-
-TEST(SegmentIntersection, UndefinedPiecesGiveNothing) {
-  const CCurveSpiral undefinedSpiral;
-  const CCurveArc undefinedArc;
-  const svy_math::TLine undefinedLine;
-  const CGenericLineImpl line(C2dPos(-100.0, -100.0), C2dPos(100.0, 100.0));
-  svy_vector<CCurveArc> cache;
-  EXPECT_FALSE(undefinedSpiral.createCache(cache));
-  EXPECT_TRUE(crossings(line, undefinedSpiral).empty());
-  EXPECT_TRUE(crossings(undefinedArc, line).empty());
-  EXPECT_TRUE(crossings(undefinedLine, line).empty());
-  EXPECT_TRUE(crossings(undefinedSpiral, undefinedArc).empty());
 }
 
 // The visitors see each segment as its own kind.

@@ -5,9 +5,9 @@
 #include <cmath>
 #include <memory>
 
+#include "curve_test_support.h"
 #include "svymath/curves/generic_line_impl.h"
 #include "svymath/curves/tline.h"
-#include "test_generic_support.h"
 
 namespace {
 

@@ -1,0 +1,130 @@
+#pragma once
+// Builders and oracles shared by the curve tests: element builders, dense sampling, numeric CSV tables and
+// an adaptive Simpson quadrature (the independent oracle for Fresnel integrals and spiral positions).
+#include <cmath>
+#include <fstream>
+#include <functional>
+#include <limits>
+#include <sstream>
+#include <string>
+#include <vector>
+
+#include "svymath/curves/curve_arc.h"
+#include "svymath/curves/curve_segment.h"
+#include "svymath/curves/curve_spiral.h"
+#include "svymath/foundation/constants.h"
+#include "svymath/foundation/math_angle.h"
+
+namespace curve_test {
+
+constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
+constexpr double kInf = std::numeric_limits<double>::infinity();
+
+inline CMathAngle azimuthDeg(double degrees) { return CMathAngle(degrees); }
+
+// An arc element starting at (north, east) heading azimuthDeg, of the given length and radius magnitude.
+inline CCurveArc makeArc(double north, double east, double azDeg, double length, double radius, bool toTheRight) {
+  CCurveDataArc data;
+  data.SetElement(length, radius, toTheRight);
+  return CCurveArc(north, east, azimuthDeg(azDeg), data);
+}
+
+inline CCurveSegment makeSegment(double north, double east, double azDeg, double length) {
+  CCurveDataSegment data;
+  data.setLen(length);
+  data.setAzDeg(0.0);
+  return CCurveSegment(north, east, azimuthDeg(azDeg), data);
+}
+
+// A full spiral element of length L to radius R.
+inline CCurveSpiral makeSpiral(double north, double east, double azDeg, double length, double radius,
+                               bool toTheRight, bool isTSSC, AlntMathSpiralType law = eMathSpiralEuler) {
+  CCurveDataSpiral data(law);
+  data.setLenAndR(length, radius, toTheRight, isTSSC);
+  return CCurveSpiral(north, east, azimuthDeg(azDeg), data);
+}
+
+// A partial spiral element of length L between the radii r1 and r2.
+inline CCurveSpiral makePartialSpiral(double north, double east, double azDeg, double length, double r1, double r2,
+                                      bool toTheRight, bool isTSSC) {
+  CCurveDataSpiral data(eMathSpiralEuler);
+  data.setLenAndTwoR(length, r1, r2, toTheRight, isTSSC);
+  return CCurveSpiral(north, east, azimuthDeg(azDeg), data);
+}
+
+// Smallest distance from p to the segment over a dense sampling of its length (an independent oracle for
+// projections), with the sampled length of the nearest sample.
+inline double sampledDistance(const CGenericSegment& segment, const C2dPos& p, int samples, double* atLength = nullptr) {
+  double best = std::numeric_limits<double>::infinity();
+  const double total = segment.getTotalLength();
+  for (int i = 0; i <= samples; ++i) {
+    const double s = total * i / samples;
+    C2dPos q;
+    if (!segment.getPosAtLength(s, q)) continue;
+    const double d = std::hypot(q.north() - p.north(), q.east() - p.east());
+    if (d < best) {
+      best = d;
+      if (atLength != nullptr) *atLength = s;
+    }
+  }
+  return best;
+}
+
+// Rows of numbers of a CSV file after its header lines; any blank, comma, tab or CR separates fields.
+inline std::vector<std::vector<double>> readNumericTable(const std::string& path, int headerLines = 1) {
+  std::vector<std::vector<double>> rows;
+  std::ifstream in(path);
+  std::string line;
+  for (int i = 0; i < headerLines && std::getline(in, line); ++i) {
+  }
+  while (std::getline(in, line)) {
+    for (char& c : line) {
+      if (c == ',' || c == '\t' || c == '\r') c = ' ';
+    }
+    std::istringstream fields(line);
+    std::vector<double> row;
+    double value = 0.0;
+    while (fields >> value) row.push_back(value);
+    if (!row.empty()) rows.push_back(row);
+  }
+  return rows;
+}
+
+inline double simpsonStep(const std::function<double(double)>& f, double a, double b, double fa, double fm, double fb,
+                          double whole, double tol, int depth) {
+  const double m = 0.5 * (a + b);
+  const double flm = f(0.5 * (a + m));
+  const double frm = f(0.5 * (m + b));
+  const double left = (m - a) / 6.0 * (fa + 4.0 * flm + fm);
+  const double right = (b - m) / 6.0 * (fm + 4.0 * frm + fb);
+  const double delta = left + right - whole;
+  if (depth <= 0 || std::fabs(delta) <= 15.0 * tol) return left + right + delta / 15.0;
+  return simpsonStep(f, a, m, fa, flm, fm, left, 0.5 * tol, depth - 1) +
+         simpsonStep(f, m, b, fm, frm, fb, right, 0.5 * tol, depth - 1);
+}
+
+// Integral of f over [a, b] by adaptive Simpson to the absolute tolerance tol, on pieces first so that
+// oscillating integrands are sampled before the error test is trusted.
+inline double integrate(const std::function<double(double)>& f, double a, double b, double tol, int pieces = 64) {
+  double sum = 0.0;
+  const double h = (b - a) / pieces;
+  for (int i = 0; i < pieces; ++i) {
+    const double lo = a + i * h;
+    const double hi = lo + h;
+    const double flo = f(lo);
+    const double fhi = f(hi);
+    const double fm = f(0.5 * (lo + hi));
+    sum += simpsonStep(f, lo, hi, flo, fm, fhi, h / 6.0 * (flo + 4.0 * fm + fhi), tol / pieces, 40);
+  }
+  return sum;
+}
+
+// The point reached after length s from the origin heading north, for a heading (radians, clockwise from
+// north) given as a function of length.
+inline void integrateHeading(const std::function<double(double)>& heading, double s, double tol, double& north,
+                             double& east) {
+  north = integrate([&](double u) { return std::cos(heading(u)); }, 0.0, s, tol, 16);
+  east = integrate([&](double u) { return std::sin(heading(u)); }, 0.0, s, tol, 16);
+}
+
+}  // namespace curve_test
