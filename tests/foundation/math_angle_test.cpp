@@ -64,55 +64,42 @@ TEST(AngleEquality, OperatorEqualsHasNoWrapButIsEqualHas) {
   EXPECT_TRUE(unset() >= radians(0));
 }
 
-TEST(AngleSetters, TangentAndAzimuthForms) {
+// Each setter in turn (a braced list is evaluated left to right): azimuths clockwise from north, the angle at
+// a vertex clockwise from the first ray, a bulge four times its arc tangent reduced. A failing setter
+// leaves the previous value.
+TEST(AngleSetters, TangentAzimuthVertexAndBulgeForms) {
   CMathAngle a(10.0);
-  EXPECT_TRUE(a.setTg(0, 0));
-  EXPECT_EQ(a.getRad(), 0);
-  a.setDeg(10);
-  EXPECT_FALSE(a.setTg(kNaN, 1));
-  EXPECT_FALSE(a.setTg(1, kNaN));
-  EXPECT_NEAR(a.getDeg(), 10, 1e-12);
-  EXPECT_TRUE(a.setAz(C2dPos(0, 0), C2dPos(0, 1)));
-  EXPECT_DOUBLE_EQ(a.getRad(), kPi / 2);
-  EXPECT_TRUE(a.setAz(C2dPos(0, 0), C2dPos(-1, 0)));
-  EXPECT_DOUBLE_EQ(a.getRad(), kPi);
-  EXPECT_TRUE(a.setAz(C2dPos(-1, -1)));
-  EXPECT_DOUBLE_EQ(a.getDeg(), -135);
-  EXPECT_TRUE(a.setAz(3.0, -3.0));
-  EXPECT_DOUBLE_EQ(a.getDeg(), -45);
-  EXPECT_TRUE(a.setAz(10, 10, 10, 20));
-  EXPECT_DOUBLE_EQ(a.getDeg(), 90);
-  EXPECT_TRUE(a.setTg(kInf, 1));
-  EXPECT_DOUBLE_EQ(a.getRad(), kPi / 2);
-}
-
-TEST(AngleSetters, AngleAtVertexIsClockwiseFromFirstRay) {
-  CMathAngle a;
-  EXPECT_TRUE(a.setAngle(C2dPos(1, 0), C2dPos(0, 0), C2dPos(0, 1)));
-  EXPECT_DOUBLE_EQ(a.getRad(), kPi / 2);
-  EXPECT_TRUE(a.setAngle(C2dPos(0, 1), C2dPos(0, 0), C2dPos(1, 0)));
-  EXPECT_DOUBLE_EQ(a.getRad(), -kPi / 2);
-  a.setDeg(5);
-  EXPECT_FALSE(a.setAngle(C2dPos(0, 0), C2dPos(0, 0), C2dPos(1, 0)));
-  EXPECT_FALSE(a.setAngle(C2dPos(1, 0), C2dPos(0, 0), C2dPos(kNaN, 0)));
-  EXPECT_NEAR(a.getDeg(), 5, 1e-12);
-}
-
-// DMS takes the sign from the degrees (minus zero is positive); a bulge is four times its arc tangent,
-// reduced.
-TEST(AngleSetters, DmsAndBulge) {
-  CMathAngle a;
+  const C2dPos o(0, 0);
+  struct {
+    bool ok;
+    double rad;
+    bool expectedOk;
+    double expected;
+  } const results[] = {{a.setTg(0, 0), a.getRad(), true, 0},
+                       {a.setTg(kInf, 1), a.getRad(), true, kPi / 2},
+                       {a.setTg(kNaN, 1), a.getRad(), false, kPi / 2},
+                       {a.setTg(1, kNaN), a.getRad(), false, kPi / 2},
+                       {a.setAz(o, C2dPos(-1, 0)), a.getRad(), true, kPi},
+                       {a.setAz(C2dPos(-1, -1)), a.getRad(), true, -0.75 * kPi},
+                       {a.setAz(3.0, -3.0), a.getRad(), true, -kPi / 4},
+                       {a.setAz(10, 10, 10, 20), a.getRad(), true, kPi / 2},
+                       {a.setAngle(C2dPos(0, 1), o, C2dPos(1, 0)), a.getRad(), true, -kPi / 2},
+                       {a.setAngle(o, o, C2dPos(1, 0)), a.getRad(), false, -kPi / 2},
+                       {a.setAngle(C2dPos(1, 0), o, C2dPos(kNaN, 0)), a.getRad(), false, -kPi / 2},
+                       {a.setAngle(C2dPos(1, 0), o, C2dPos(0, 1)), a.getRad(), true, kPi / 2},
+                       {a.setBulge(1), a.getRad(), true, kPi},
+                       {a.setBulge(-0.5), a.getRad(), true, -4 * std::atan(0.5)},
+                       {a.setBulge(2), a.getRad(), true, 4 * std::atan(2.0) - 2 * kPi},
+                       {a.setBulge(kNaN), a.getRad(), false, 4 * std::atan(2.0) - 2 * kPi}};
+  for (const auto& r : results) {
+    EXPECT_EQ(r.ok, r.expectedOk) << (&r - results);
+    EXPECT_NEAR(r.rad, r.expected, 1e-15) << (&r - results);
+  }
+  // DMS takes the sign from the degrees; minus zero degrees is positive.
   a.setDMS(-12, 30, 36);
   EXPECT_NEAR(a.getDeg(), -12.51, 1e-12);
   a.setDMS(-0.0, 30, 0);
   EXPECT_NEAR(a.getDeg(), 0.5, 1e-12);
-  EXPECT_TRUE(a.setBulge(1));
-  EXPECT_NEAR(a.getRad(), kPi, 1e-12);
-  EXPECT_TRUE(a.setBulge(2));
-  EXPECT_NEAR(a.getRad(), -1.8546, 1e-4);
-  EXPECT_TRUE(a.setBulge(-0.5));
-  EXPECT_NEAR(a.getRad(), -4 * std::atan(0.5), 1e-12);
-  EXPECT_FALSE(a.setBulge(kNaN));
 }
 
 TEST(AngleSetters, ChordAndRadiusIsTwiceTheChordToRadiusAngle) {
