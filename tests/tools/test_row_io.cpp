@@ -1,6 +1,8 @@
 // The row reader and writer on string streams: number text, CSV fields, headers, comments, output forms.
 #include "row_io.h"
 
+#include "support/comma_locale.h"
+
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -58,6 +60,17 @@ TEST(FormatNumber, FixedDecimalsRoundAndDropNegativeZero) {
   EXPECT_EQ(svy_tool::formatNumber(-0.0006, 3), "-0.001");
   EXPECT_EQ(svy_tool::formatNumber(std::nan(""), 3), "nan");
   EXPECT_EQ(svy_tool::formatNumber(-HUGE_VAL, 3), "-inf");
+}
+
+TEST(NumberText, IndependentOfTheProcessLocale) {
+  const svy_test::CDecimalCommaCLocale comma;
+  if (!comma.active()) GTEST_SKIP() << "no decimal-comma locale installed";
+  double value = 0.0;
+  EXPECT_TRUE(svy_tool::parseNumber("1234.5", value));
+  EXPECT_EQ(value, 1234.5);
+  EXPECT_FALSE(svy_tool::parseNumber("1234,5", value));
+  EXPECT_EQ(svy_tool::formatNumber(1234.5, 2), "1234.50");
+  EXPECT_EQ(svy_tool::formatNumber(0.1, -1), "0.10000000000000001");
 }
 
 std::vector<InputRow> readAll(const std::string& text, std::vector<std::string> names, bool numeric) {

@@ -8,7 +8,6 @@
 #include <cerrno>
 #include <charconv>
 #include <cmath>
-#include <cstdio>
 #include <cstring>
 #include <fstream>
 #include <iostream>
@@ -131,13 +130,15 @@ bool parseNumber(const std::string& text, double& value) {
 std::string formatNumber(double value, int decimals) {
   if (std::isnan(value)) return "nan";
   if (std::isinf(value)) return value > 0.0 ? "inf" : "-inf";
+  // to_chars writes the C locale's form whatever locale the process runs in ("%.17g" / "%.*f" otherwise).
   char buffer[kNumberBufferSize];
-  if (decimals < 0) {
-    std::snprintf(buffer, sizeof buffer, "%.*g", kRoundTripDigits, value);
-    return buffer;
-  }
-  std::snprintf(buffer, sizeof buffer, "%.*f", std::min(decimals, kMaxDecimals), value);
-  std::string text = buffer;
+  const auto result = decimals < 0
+                          ? std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::general,
+                                          kRoundTripDigits)
+                          : std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed,
+                                          std::min(decimals, kMaxDecimals));
+  std::string text(buffer, result.ptr);
+  if (decimals < 0) return text;
   if (text[0] == '-' && text.find_first_not_of("0.", 1) == std::string::npos) text.erase(0, 1);
   return text;
 }
