@@ -4,7 +4,8 @@ svy_ensure_packages() {
   local missing=()
   local pkg
   for pkg in "$@"; do
-    dpkg -s "$pkg" >/dev/null 2>&1 || missing+=("$pkg")
+    # A removed package whose configuration files remain is still known to dpkg: check its status line.
+    dpkg -s "$pkg" 2>/dev/null | grep -q '^Status: install ok installed' || missing+=("$pkg")
   done
   if [ ${#missing[@]} -eq 0 ]; then
     return 0
