@@ -201,36 +201,32 @@ TEST(dENSoutInfo, RotationKeepsLengthAndRotatingBackRestores) {
   ASSERT_EQ(dENSoutInfo(1.0, 0.0, 0.0, 90.0, a, b, h), 1);
   EXPECT_NEAR(a, 0.0, 1e-15);
   EXPECT_NEAR(b, 1.0, 1e-15);
-  // Shorter than 1e-8: no direction, zeros and the height.
-  EXPECT_EQ(dENSoutInfo(0.9e-8, 0.0, 42.0, 30.0, a, b, h), 0);
+  EXPECT_EQ(dENSoutInfo(0.9e-8, 0.0, 42.0, 30.0, a, b, h), 0);  // shorter than 1e-8: zeros and the height
   EXPECT_EQ(a, 0.0);
   EXPECT_EQ(b, 0.0);
   EXPECT_EQ(h, 42.0);
   EXPECT_EQ(dENSoutInfo(1.1e-8, 0.0, 42.0, 30.0, a, b, h), 1);
 }
 
-TEST(boCompute2DDistanceBetweenCoords, IgnoresHeightAndRejectsNonFinitePlanValues) {
-  double distance = -1.0;
+// The TCoords forms: the distance ignores the height but needs finite plan values; the azimuth fails for
+// points within the (inclusive) coincidence window of 1e-10, although Inverse2D gives one there.
+TEST(CoordsForms, DistanceIgnoresHeightAndAzimuthFailsWithinTheCoincidenceWindow) {
+  double distance = -1.0, azimuth = -1.0;
   ASSERT_TRUE(boCompute2DDistanceBetweenCoords(coords(5000000, 500000, 0), coords(5000004, 500003, 999), distance));
   EXPECT_DOUBLE_EQ(distance, 5.0);
   EXPECT_TRUE(boCompute2DDistanceBetweenCoords(coords(0, 0, kNaN), coords(1, 1, 0), distance));
   distance = -1.0;
-  EXPECT_FALSE(boCompute2DDistanceBetweenCoords(coords(kNaN, 0), coords(1, 1), distance));
-  EXPECT_FALSE(boCompute2DDistanceBetweenCoords(coords(0, 0), coords(1, -kInf), distance));
-  EXPECT_EQ(distance, -1.0);
-  EXPECT_FALSE(boCompute2DDistanceBetweenCoords(coords(-1e308, 0), coords(1e308, 0), distance));
-}
-
-TEST(boComputeAzimuthBetweenCoords, SamePointWithinTheCoincidenceWindowFails) {
-  double azimuth = -1.0;
   const TCoords p = coords(5000000.0, 500000.0);
-  // 1e-10 apart is still the same point (the window is inclusive), although Inverse2D gives an azimuth.
+  const TCoords pairs[][2] = {{coords(kNaN, 0), coords(1, 1)}, {coords(0, 0), coords(1, -kInf)}};
+  for (const auto& q : pairs) {
+    EXPECT_FALSE(boCompute2DDistanceBetweenCoords(q[0], q[1], distance));
+    EXPECT_FALSE(boComputeAzimuthBetweenCoords(q[0], q[1], azimuth));
+  }
   EXPECT_FALSE(boComputeAzimuthBetweenCoords(p, p, azimuth));
   EXPECT_FALSE(boComputeAzimuthBetweenCoords(coords(0, 0), coords(0, 1e-10), azimuth));
-  EXPECT_FALSE(boComputeAzimuthBetweenCoords(coords(0, 0), coords(kNaN, 5), azimuth));
-  EXPECT_FALSE(boComputeAzimuthBetweenCoords(coords(0, kInf), coords(0, 5), azimuth));
+  EXPECT_EQ(distance, -1.0);
   EXPECT_EQ(azimuth, -1.0);
-  double distance = 0.0;
+  EXPECT_FALSE(boCompute2DDistanceBetweenCoords(coords(-1e308, 0), coords(1e308, 0), distance));
   EXPECT_TRUE(Inverse2D(0.0, 0.0, 1e-10, 0.0, azimuth, distance));
   EXPECT_DOUBLE_EQ(azimuth, kPi / 2);
   azimuth = -1.0;  // beyond the window, at grid coordinates: due east

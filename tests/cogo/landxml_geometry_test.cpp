@@ -9,6 +9,7 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <iterator>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -24,17 +25,10 @@ using svy_math::units::kPi;
 
 struct Element {
   std::string file;
-  std::string tag;
   std::string head;  // the opening tag with its attributes
   std::string body;
+  double radiansPerUnit;  // of the file's directions
 };
-
-std::string readFile(const std::filesystem::path& path) {
-  std::ifstream in(path, std::ios::binary);
-  std::ostringstream text;
-  text << in.rdbuf();
-  return text.str();
-}
 
 std::string textAttribute(const std::string& head, const std::string& name) {
   const std::string key = " " + name + "=\"";
@@ -69,28 +63,22 @@ double radiansPerDirectionUnit(const std::string& text) {
   return std::nan("");
 }
 
-struct Collected {
-  std::vector<Element> elements;
-  std::vector<double> radiansPerUnit;  // per element, from its file
-};
-
-Collected collect(const std::string& tag) {
-  Collected out;
+std::vector<Element> collect(const std::string& tag) {
+  std::vector<Element> out;
   const std::filesystem::path root = svy_test::refdataPath("alignment/ifc-infra-unit-test");
   for (const auto& entry : std::filesystem::recursive_directory_iterator(root)) {
     std::string ext = entry.path().extension().string();
     for (char& ch : ext) ch = static_cast<char>(std::tolower(static_cast<unsigned char>(ch)));
     if (ext != ".xml") continue;
-    const std::string text = readFile(entry.path());
-    const double perUnit = radiansPerDirectionUnit(text);
+    std::ifstream in(entry.path(), std::ios::binary);
+    const std::string text{std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
     std::size_t at = 0;
     while ((at = text.find("<" + tag + " ", at)) != std::string::npos) {
       const std::size_t headEnd = text.find('>', at);
       const std::size_t close = text.find("</" + tag + ">", headEnd);
       if (headEnd == std::string::npos || close == std::string::npos) break;
-      out.elements.push_back(Element{entry.path().filename().string(), tag, text.substr(at, headEnd - at),
-                                     text.substr(headEnd + 1, close - headEnd - 1)});
-      out.radiansPerUnit.push_back(perUnit);
+      out.push_back(Element{entry.path().filename().string(), text.substr(at, headEnd - at),
+                            text.substr(headEnd + 1, close - headEnd - 1), radiansPerDirectionUnit(text)});
       at = close;
     }
   }
@@ -102,10 +90,9 @@ constexpr double kPublishedPos = 5e-6;
 
 TEST(LandXmlLines, InverseGivesThePublishedDirectionAndLength) {
   SVY_SKIP_WITHOUT_REFDATA();
-  const Collected lines = collect("Line");
-  ASSERT_GE(lines.elements.size(), 5u);
-  for (std::size_t i = 0; i < lines.elements.size(); ++i) {
-    const Element& line = lines.elements[i];
+  const std::vector<Element> lines = collect("Line");
+  ASSERT_GE(lines.size(), 5u);
+  for (const Element& line : lines) {
     SCOPED_TRACE(line.file + ": " + line.head);
     C2dPos start, end;
     ASSERT_TRUE(childPos(line.body, "Start", start));
@@ -113,7 +100,7 @@ TEST(LandXmlLines, InverseGivesThePublishedDirectionAndLength) {
     double azimuth = 0, distance = 0;
     ASSERT_TRUE(Inverse2D(start.east(), start.north(), end.east(), end.north(), azimuth, distance));
     EXPECT_NEAR(distance, attribute(line.head, "length"), kPublishedPos);
-    const double published = attribute(line.head, "dir") * lines.radiansPerUnit[i];
+    const double published = attribute(line.head, "dir") * line.radiansPerUnit;
     if (!std::isnan(published)) {
       EXPECT_NEAR(std::remainder(azimuth - published, 2 * kPi), 0.0, kPublishedPos / distance + 1e-9);
       double e = 0, n = 0;
@@ -128,11 +115,10 @@ TEST(LandXmlLines, InverseGivesThePublishedDirectionAndLength) {
 // line through the start meets the circle at the start and opposite it; the start tangent touches.
 TEST(LandXmlArcs, CentreRadialLineAndStartTangentAgreeWithTheCircle) {
   SVY_SKIP_WITHOUT_REFDATA();
-  const Collected arcs = collect("Curve");
-  ASSERT_GE(arcs.elements.size(), 5u);
+  const std::vector<Element> arcs = collect("Curve");
+  ASSERT_GE(arcs.size(), 5u);
   int tangentsChecked = 0;
-  for (std::size_t i = 0; i < arcs.elements.size(); ++i) {
-    const Element& arc = arcs.elements[i];
+  for (const Element& arc : arcs) {
     SCOPED_TRACE(arc.file + ": " + arc.head);
     C2dPos start, center, end, s1, s2;
     ASSERT_TRUE(childPos(arc.body, "Start", start) && childPos(arc.body, "Center", center) &&
@@ -150,7 +136,7 @@ TEST(LandXmlArcs, CentreRadialLineAndStartTangentAgreeWithTheCircle) {
     EXPECT_NEAR(s2.east(), start.east(), 1e-8);
     EXPECT_NEAR(s1.north(), 2 * center.north() - start.north(), 1e-8);
     EXPECT_NEAR(s1.east(), 2 * center.east() - start.east(), 1e-8);
-    const double dirStart = attribute(arc.head, "dirStart") * arcs.radiansPerUnit[i];
+    const double dirStart = attribute(arc.head, "dirStart") * arc.radiansPerUnit;
     if (std::isnan(dirStart)) continue;
     double e = 0, n = 0;
     Radiate2D(start.east(), start.north(), dirStart, 40.0, e, n);
