@@ -195,18 +195,13 @@ TEST(PackedDms, DegreesToPackedAndBack) {
 }
 
 TEST(PackedDms, SplitNeverReachesSixty) {
-  for (double x = 0.0; x < 2.0; x += 0.0137) {
-    bool negative = true;
-    int d = -1, m = -1;
-    double s = -1;
-    Deg2DDDMMSS(-x + 1.0 / 7200.0 - 1e-9, negative, d, m, s, 0);
-    EXPECT_LT(m, 60);
-    EXPECT_LT(s, 60.0);
-    EXPECT_GE(s, 0.0);
-  }
   bool negative = false;
   int d = 0, m = 0;
   double s = 0;
+  for (double x = 0.0; x < 2.0; x += 0.0137) {
+    Deg2DDDMMSS(-x + 1.0 / 7200.0 - 1e-9, negative, d, m, s, 0);
+    EXPECT_TRUE(m < 60 && s < 60.0 && s >= 0.0) << x << ": " << m << "' " << s << "\"";
+  }
   Deg2DDDMMSS(-12.51, negative, d, m, s, 2);
   EXPECT_TRUE(negative);
   EXPECT_EQ(d, 12);
