@@ -1,6 +1,8 @@
 #pragma once
 // Builders and oracles shared by the curve tests: element builders, dense sampling, numeric CSV tables and
 // an adaptive Simpson quadrature (the independent oracle for Fresnel integrals and spiral positions).
+#include <gtest/gtest.h>
+
 #include <cmath>
 #include <fstream>
 #include <functional>
@@ -21,6 +23,20 @@ constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 constexpr double kInf = std::numeric_limits<double>::infinity();
 
 inline CMathAngle azimuthDeg(double degrees) { return CMathAngle(degrees); }
+
+inline void expectPosNear(const C2dPos& actual, double north, double east, double tol) {
+  EXPECT_NEAR(actual.north(), north, tol);
+  EXPECT_NEAR(actual.east(), east, tol);
+}
+
+// The position at length s of a segment (NaN when it has none, which fails any comparison).
+inline C2dPos posAt(const CGenericSegment& segment, double s) {
+  C2dPos pos(kNaN, kNaN);
+  if (!segment.getPosAtLength(s, pos)) ADD_FAILURE() << "no position at " << s;
+  return pos;
+}
+
+inline double distance(const C2dPos& a, const C2dPos& b) { return std::hypot(a.north() - b.north(), a.east() - b.east()); }
 
 // An arc element starting at (north, east) heading azimuthDeg, of the given length and radius magnitude.
 inline CCurveArc makeArc(double north, double east, double azDeg, double length, double radius, bool toTheRight) {
@@ -61,7 +77,7 @@ inline double sampledDistance(const CGenericSegment& segment, const C2dPos& p, i
     const double s = total * i / samples;
     C2dPos q;
     if (!segment.getPosAtLength(s, q)) continue;
-    const double d = std::hypot(q.north() - p.north(), q.east() - p.east());
+    const double d = distance(p, q);
     if (d < best) {
       best = d;
       if (atLength != nullptr) *atLength = s;

@@ -24,8 +24,7 @@ TEST_P(LineExtentTest, AcceptsLengthsByIntersectionType) {
   const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(0.0, 100.0), c.type);
   EXPECT_EQ(line.checkDistanceAlongIsOnLine(c.along), c.onLine) << "along " << c.along;
   // The same rule decides whether a point beside the line gets a length.
-  double length = -7.0;
-  double offset = -7.0;
+  double length = -7.0, offset = -7.0;
   EXPECT_EQ(line.getLengthAndOffset(C2dPos(3.0, c.along), length, offset), c.onLine);
   if (c.onLine) {
     // The direction east is pi/2 rounded to a double: its cosine leaves 6e-17 of the along distance across.
@@ -64,14 +63,12 @@ TEST_P(LineRoundTripTest, PositionThenLengthAndOffsetGivesThemBack) {
   ASSERT_TRUE(line.getPosAtLengthAndOffset(c.length, c.offset, pos));
   // Independent check of the axis convention: offset to the right of azimuth a is (-sin a, cos a).
   const double a = c.azDeg * svy_math::units::kDegToRad;
-  EXPECT_NEAR(pos.north(), c.north + c.length * std::cos(a) - c.offset * std::sin(a), 1e-8);
-  EXPECT_NEAR(pos.east(), c.east + c.length * std::sin(a) + c.offset * std::cos(a), 1e-8);
-  double length = 0.0;
-  double offset = 0.0;
+  curve_test::expectPosNear(pos, c.north + c.length * std::cos(a) - c.offset * std::sin(a),
+                            c.east + c.length * std::sin(a) + c.offset * std::cos(a), 1e-8);
+  double length = 0.0, offset = 0.0, distance = 0.0;
   ASSERT_TRUE(line.getLengthAndOffset(pos, length, offset));
   EXPECT_NEAR(length, c.length, 1e-8);
   EXPECT_NEAR(offset, c.offset, 1e-8);
-  double distance = 0.0;
   ASSERT_TRUE(line.getShortestDistanceToPoint(pos, distance));
   EXPECT_NEAR(distance, std::fabs(c.offset), 1e-8);
 }
@@ -83,35 +80,22 @@ INSTANTIATE_TEST_SUITE_P(Table, LineRoundTripTest,
                                            RoundTripCase{5000000.0, 500000.0, 37.25, 77.7, -12.3},
                                            RoundTripCase{-300.0, 42.0, 271.5, 200.0, 1000.0}));
 
-TEST(GenericLine, LineFromPointAndAzimuthIsThousandLongAndUnbounded) {
-  const CGenericLineImpl line(C2dPos(100.0, 200.0), azimuthDeg(90.0));
-  EXPECT_EQ(line.getIntersectionType(), eIntersectUnbounded);
-  EXPECT_NEAR(line.getTotalLength(), 1000.0, 1e-9);
-  EXPECT_NEAR(line.getEndNorthing(), 100.0, 1e-9);
-  EXPECT_NEAR(line.getEndEasting(), 1200.0, 1e-9);
-  double length = 0.0;
-  double offset = 0.0;
-  EXPECT_TRUE(line.getLengthAndOffset(C2dPos(100.0, -5000.0), length, offset));
+// A line from a point and an azimuth is 1000 long and unbounded; tiny lengths and offsets come back as an
+// exact (positive) zero; the shortest distance is to the prolonged line, beyond the extent as well.
+TEST(GenericLine, DefaultLengthExactZeroAndProlongedDistance) {
+  const CGenericLineImpl fromAzimuth(C2dPos(100.0, 200.0), azimuthDeg(90.0));
+  EXPECT_EQ(fromAzimuth.getIntersectionType(), eIntersectUnbounded);
+  EXPECT_NEAR(fromAzimuth.getEndEasting(), 1200.0, 1e-9);
+  double length = 1.0, offset = 1.0, distance = 0.0;
+  EXPECT_TRUE(fromAzimuth.getLengthAndOffset(C2dPos(100.0, -5000.0), length, offset));
   EXPECT_NEAR(length, -5200.0, 1e-9);
-}
-
-TEST(GenericLine, TinyAlongAndOffsetComeBackAsExactZero) {
   const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(100.0, 0.0));
-  double length = 1.0;
-  double offset = 1.0;
   ASSERT_TRUE(line.getLengthAndOffset(C2dPos(1e-13, 5e-13), length, offset));
   EXPECT_EQ(length, 0.0);
   EXPECT_EQ(offset, 0.0);
   EXPECT_FALSE(std::signbit(offset));
-}
-
-TEST(GenericLine, ShortestDistanceUsesTheProlongedLineBeyondTheEnd) {
-  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(100.0, 0.0));
-  double distance = 0.0;
   ASSERT_TRUE(line.getShortestDistanceToPoint(C2dPos(500.0, -3.0), distance));
   EXPECT_NEAR(distance, 3.0, 1e-12);  // not the 400.01 m to the end point
-  double length = 0.0;
-  double offset = 0.0;
   EXPECT_FALSE(line.getLengthAndOffset(C2dPos(500.0, -3.0), length, offset));
 }
 

@@ -29,10 +29,7 @@ void expectSamePoints(svy_vector<C2dPos> a, svy_vector<C2dPos> b, double toleran
   const auto byNorth = [](const C2dPos& p, const C2dPos& q) { return p.north() < q.north(); };
   std::sort(a.begin(), a.end(), byNorth);
   std::sort(b.begin(), b.end(), byNorth);
-  for (std::size_t i = 0; i < a.size(); ++i) {
-    EXPECT_NEAR(a[i].north(), b[i].north(), tolerance);
-    EXPECT_NEAR(a[i].east(), b[i].east(), tolerance);
-  }
+  for (std::size_t i = 0; i < a.size(); ++i) curve_test::expectPosNear(a[i], b[i].north(), b[i].east(), tolerance);
 }
 
 struct LineLineCase {
@@ -51,10 +48,7 @@ TEST_P(LineLineTest, CrossingsByCase) {
   svy_vector<C2dPos> out(1, C2dPos(-9.0, -9.0));  // results are appended
   EXPECT_EQ(a.calcIntersections(b, out), c.hits > 0);
   ASSERT_EQ(out.size(), static_cast<std::size_t>(1 + c.hits));
-  if (c.hits == 1) {
-    EXPECT_NEAR(out[1].north(), c.expected.north(), 1e-9);
-    EXPECT_NEAR(out[1].east(), c.expected.east(), 1e-9);
-  }
+  if (c.hits == 1) curve_test::expectPosNear(out[1], c.expected.north(), c.expected.east(), 1e-9);
   if (c.type == eIntersectOnSegment) expectSamePoints(crossings(a, b), crossings(b, a), 1e-9);
 }
 
@@ -83,28 +77,23 @@ INSTANTIATE_TEST_SUITE_P(
                      C2dPos(5000100, 500000), eIntersectOnSegment, 1, C2dPos(5000050, 500050)}));
 
 TEST(LineArcIntersection, TwoCrossingsTangencyMissAndSweep) {
-  const CCurveArc circleArc = makeArc(0.0, 0.0, 0.0, 100.0, 50.0, true);  // centre (0, 50), quarter-ish turn
+  const CCurveArc circleArc = makeArc(0.0, 0.0, 0.0, 100.0, 50.0, true);  // centre (0, 50)
   // A north-south line through the centre meets the circle at (50, 50) and (-50, 50); only (50, 50) is in
   // the arc's sweep, which runs clockwise from west of the centre (the start) to 24.6 degrees.
   const CGenericLineImpl through(C2dPos(-100.0, 50.0), C2dPos(100.0, 50.0));
   const svy_vector<C2dPos> hits = crossings(through, circleArc);
   ASSERT_EQ(hits.size(), 1u);
-  EXPECT_NEAR(hits[0].north(), 50.0, 1e-9);
-  EXPECT_NEAR(hits[0].east(), 50.0, 1e-9);
+  curve_test::expectPosNear(hits[0], 50.0, 50.0, 1e-9);
   expectSamePoints(hits, crossings(circleArc, through), 1e-12);
-
   CCurveArc unbounded = circleArc;
   unbounded.setIntersectionType(eIntersectUnbounded);
   EXPECT_EQ(crossings(through, unbounded).size(), 2u);
-
   // The tangent at the start touches once; a line beside it misses.
-  const CGenericLineImpl tangent(C2dPos(-10.0, 0.0), C2dPos(10.0, 0.0));
-  const svy_vector<C2dPos> touch = crossings(tangent, circleArc);
+  const svy_vector<C2dPos> touch = crossings(CGenericLineImpl(C2dPos(-10.0, 0.0), C2dPos(10.0, 0.0)), circleArc);
   ASSERT_EQ(touch.size(), 1u);
   EXPECT_NEAR(touch[0].north(), 0.0, 1e-6);
   EXPECT_NEAR(touch[0].east(), 0.0, 1e-9);
-  const CGenericLineImpl beside(C2dPos(-10.0, -0.01), C2dPos(10.0, -0.01));
-  EXPECT_TRUE(crossings(beside, circleArc).empty());
+  EXPECT_TRUE(crossings(CGenericLineImpl(C2dPos(-10.0, -0.01), C2dPos(10.0, -0.01)), circleArc).empty());
 }
 
 TEST(LineArcIntersection, EveryCrossingLiesOnBothPieces) {
@@ -113,13 +102,11 @@ TEST(LineArcIntersection, EveryCrossingLiesOnBothPieces) {
     for (double lineAz = 5.0; lineAz < 180.0; lineAz += 31.0) {
       const CGenericLineImpl line(C2dPos(5000020.0, 500030.0), CMathAngle(lineAz), 400.0, eIntersectUnbounded);
       for (const C2dPos& p : crossings(line, arc)) {
-        double distance = 0.0;
+        double distance = 1.0, length = 0.0, offset = 0.0;
         ASSERT_TRUE(arc.getShortestDistanceToPoint(p, distance));
         EXPECT_NEAR(distance, 0.0, 1e-7);
         ASSERT_TRUE(line.getShortestDistanceToPoint(p, distance));
         EXPECT_NEAR(distance, 0.0, 1e-7);
-        double length = 0.0;
-        double offset = 0.0;
         EXPECT_TRUE(arc.getLengthAndOffset(p, length, offset));
       }
     }
@@ -127,83 +114,53 @@ TEST(LineArcIntersection, EveryCrossingLiesOnBothPieces) {
 }
 
 TEST(ArcArcIntersection, TwoCrossingsTangencyAndMiss) {
+  const double circle = 2.0 * svy_math::units::kPi * 50.0;
   // Two circles of radius 50 with centres 60 apart cross at 40 from the line of centres.
-  const CCurveArc a = makeArc(0.0, -50.0, 0.0, 2.0 * svy_math::units::kPi * 50.0, 50.0, true);   // centre (0, 0)
-  const CCurveArc b = makeArc(0.0, 110.0, 180.0, 2.0 * svy_math::units::kPi * 50.0, 50.0, true);  // centre (0, 60)
+  const CCurveArc a = makeArc(0.0, -50.0, 0.0, circle, 50.0, true);   // centre (0, 0)
+  const CCurveArc b = makeArc(0.0, 110.0, 180.0, circle, 50.0, true);  // centre (0, 60)
   const svy_vector<C2dPos> hits = crossings(a, b);
   ASSERT_EQ(hits.size(), 2u);
-  for (const C2dPos& p : hits) {
-    EXPECT_NEAR(p.east(), 30.0, 1e-9);
-    EXPECT_NEAR(std::fabs(p.north()), 40.0, 1e-9);
-  }
+  for (const C2dPos& p : hits) curve_test::expectPosNear(p, p.north() > 0.0 ? 40.0 : -40.0, 30.0, 1e-9);
   expectSamePoints(hits, crossings(b, a), 1e-9);
   // Externally tangent circles (centres 100 apart) touch once; farther apart they miss.
-  const CCurveArc touching = makeArc(0.0, 150.0, 180.0, 2.0 * svy_math::units::kPi * 50.0, 50.0, true);
-  const svy_vector<C2dPos> touch = crossings(a, touching);
+  const svy_vector<C2dPos> touch = crossings(a, makeArc(0.0, 150.0, 180.0, circle, 50.0, true));
   ASSERT_EQ(touch.size(), 1u);
   EXPECT_NEAR(touch[0].east(), 50.0, 1e-6);
-  const CCurveArc apart = makeArc(0.0, 151.0, 180.0, 2.0 * svy_math::units::kPi * 50.0, 50.0, true);
-  EXPECT_TRUE(crossings(a, apart).empty());
-  // A short arc of a keeps only the crossing within its sweep.
-  // From west of the centre clockwise through north to 47.5 degrees: (40, 30) lies at 36.9, (-40, 30) at 143.1.
-  const CCurveArc shortArc = makeArc(0.0, -50.0, 0.0, 120.0, 50.0, true);
-  const svy_vector<C2dPos> one = crossings(shortArc, b);
+  EXPECT_TRUE(crossings(a, makeArc(0.0, 151.0, 180.0, circle, 50.0, true)).empty());
+  // A short arc of a keeps only the crossing within its sweep: from west of the centre clockwise through
+  // north to 47.5 degrees, (40, 30) lies at 36.9, (-40, 30) at 143.1.
+  const svy_vector<C2dPos> one = crossings(makeArc(0.0, -50.0, 0.0, 120.0, 50.0, true), b);
   ASSERT_EQ(one.size(), 1u);
   EXPECT_NEAR(one[0].north(), 40.0, 1e-9);
 }
 
-// Spiral crossings come from the 20-arc approximation: each hit lies on one of the cached arcs and, to the
-// accuracy of that approximation, on the spiral.
-TEST(SpiralIntersection, CrossingsLieOnTheApproximatingArcs) {
+// Spiral crossings come from the 20-arc approximation: a line square to the spiral crosses it once, on one
+// of the cached arcs and, to the accuracy of that approximation, on the spiral. Where two approximating
+// arcs meet (every 6 m here) the line crosses both, and it is still one crossing, at the shared point.
+TEST(SpiralIntersection, SquareLinesCrossOnceOnTheApproximatingArcs) {
   const CCurveSpiral spiral = makeSpiral(100.0, 200.0, 30.0, 120.0, 150.0, true, true);
   svy_vector<CCurveArc> cache;
   ASSERT_TRUE(spiral.createCache(cache));
   ASSERT_EQ(cache.size(), static_cast<std::size_t>(CGenericSpiral::kCacheArcs));
-  const auto nearestCacheArc = [&](const C2dPos& p) {
-    double best = 1e9;
-    for (const CCurveArc& arc : cache) {
-      double length = 0.0;
-      double offset = 0.0;
-      if (arc.getLengthAndOffset(p, length, offset)) best = std::min(best, std::fabs(offset));
-    }
-    return best;
-  };
-  int total = 0;
   for (double across = 5.0; across < 120.0; across += 9.0) {
-    C2dPos on;
-    ASSERT_TRUE(spiral.getPosAtLength(across, on));
-    CMathAngle tangent;
-    ASSERT_TRUE(spiral.getAzimuthAtLength(across, tangent));
-    const CMathAngle normal = tangent + CMathAngle(90.0);
-    const CGenericLineImpl crossing(C2dPos(on.north() - 10.0 * normal.getCos(), on.east() - 10.0 * normal.getSin()),
-                                    normal, 20.0, eIntersectOnSegment);
-    const svy_vector<C2dPos> hits = crossings(spiral, crossing);
-    ASSERT_EQ(hits.size(), 1u) << across;
-    expectSamePoints(hits, crossings(crossing, spiral), 1e-12);
-    EXPECT_LT(nearestCacheArc(hits[0]), 1e-8);
-    double distance = 0.0;
-    ASSERT_TRUE(spiral.getShortestDistanceToPoint(hits[0], distance));
-    EXPECT_LT(distance, 1e-4);  // the approximation's own error, far below a millimetre here
-    ++total;
-  }
-  EXPECT_GT(total, 10);
-}
-
-// A line square to the spiral at a point shared by two approximating arcs crosses both; it is one crossing.
-TEST(SpiralIntersection, CrossingAtSharedArcEndIsReportedOnce) {
-  const CCurveSpiral spiral = makeSpiral(0.0, 0.0, 0.0, 120.0, 150.0, true, true);  // arcs end every 6 m
-  for (const double node : {6.0, 12.0, 60.0, 114.0}) {
-    C2dPos on;
-    ASSERT_TRUE(spiral.getPosAtLength(node, on));
-    CMathAngle tangent;
-    ASSERT_TRUE(spiral.getAzimuthAtLength(node, tangent));
-    const CMathAngle normal = tangent + CMathAngle(90.0);
-    const CGenericLineImpl line(C2dPos(on.north() - 5.0 * normal.getCos(), on.east() - 5.0 * normal.getSin()), normal,
-                                10.0, eIntersectOnSegment);
-    const svy_vector<C2dPos> hits = crossings(spiral, line);
-    ASSERT_EQ(hits.size(), 1u) << node;
-    EXPECT_NEAR(hits[0].north(), on.north(), 1e-9);
-    EXPECT_NEAR(hits[0].east(), on.east(), 1e-9);
+    for (const double at : {across, 6.0 * std::floor(across / 6.0 + 1.0)}) {
+      SCOPED_TRACE(at);
+      const C2dPos on = curve_test::posAt(spiral, at);
+      const CMathAngle normal = CMathAngle(spiral.getAzimuthAtLength(at)) + CMathAngle(90.0);
+      const CGenericLineImpl line(C2dPos(on.north() - 10.0 * normal.getCos(), on.east() - 10.0 * normal.getSin()),
+                                  normal, 20.0, eIntersectOnSegment);
+      const svy_vector<C2dPos> hits = crossings(spiral, line);
+      ASSERT_EQ(hits.size(), 1u);
+      expectSamePoints(hits, crossings(line, spiral), 1e-12);
+      double nearestArc = 1e9, distance = 1.0, length = 0.0, offset = 0.0;
+      for (const CCurveArc& arc : cache) {
+        if (arc.getLengthAndOffset(hits[0], length, offset)) nearestArc = std::min(nearestArc, std::fabs(offset));
+      }
+      EXPECT_LT(nearestArc, 1e-8);
+      ASSERT_TRUE(spiral.getShortestDistanceToPoint(hits[0], distance));
+      EXPECT_LT(distance, 1e-4);  // the approximation's own error, far below a millimetre here
+      EXPECT_TRUE(at == across || curve_test::distance(hits[0], on) < 1e-9);
+    }
   }
 }
 
@@ -213,26 +170,24 @@ TEST(SpiralIntersection, SpiralWithArcAndSpiralWithSpiral) {
   const svy_vector<C2dPos> withArc = crossings(spiral, arc);
   ASSERT_EQ(withArc.size(), 1u);
   expectSamePoints(withArc, crossings(arc, spiral), 1e-12);
-  double distance = 0.0;
+  double distance = 1.0;
   ASSERT_TRUE(arc.getShortestDistanceToPoint(withArc[0], distance));
   EXPECT_NEAR(distance, 0.0, 1e-8);
   ASSERT_TRUE(spiral.getShortestDistanceToPoint(withArc[0], distance));
   EXPECT_LT(distance, 1e-4);
-
-  // The mirror image about the north axis meets the spiral only near the shared start; the approximating
-  // arcs start slightly off the spirals' tangent, so their lens may add a second hit a little further on.
-  const CCurveSpiral mirror = makeSpiral(0.0, 0.0, 0.0, 100.0, 200.0, false, true);
   const CCurveSpiral across = makeSpiral(60.0, -20.0, 80.0, 60.0, 100.0, true, true);
   const svy_vector<C2dPos> hits = crossings(spiral, across);
   ASSERT_FALSE(hits.empty());
   for (const C2dPos& p : hits) {
-    ASSERT_TRUE(spiral.getShortestDistanceToPoint(p, distance));
-    EXPECT_LT(distance, 1e-4);
-    ASSERT_TRUE(across.getShortestDistanceToPoint(p, distance));
-    EXPECT_LT(distance, 1e-4);
+    for (const CCurveSpiral* piece : {&spiral, &across}) {
+      ASSERT_TRUE(piece->getShortestDistanceToPoint(p, distance));
+      EXPECT_LT(distance, 1e-4);
+    }
   }
   expectSamePoints(hits, crossings(across, spiral), 1e-9);
-  const svy_vector<C2dPos> mirrored = crossings(spiral, mirror);
+  // The mirror image about the north axis meets the spiral only near the shared start; the approximating
+  // arcs start slightly off the spirals' tangent, so their lens may add a second hit a little further on.
+  const svy_vector<C2dPos> mirrored = crossings(spiral, makeSpiral(0.0, 0.0, 0.0, 100.0, 200.0, false, true));
   ASSERT_FALSE(mirrored.empty());
   for (const C2dPos& p : mirrored) {
     EXPECT_LT(std::fabs(p.east()), 1e-4);
