@@ -4,14 +4,14 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
-#include <limits>
 
+#include "curve_test_support.h"
 #include "svymath/curves/curve_formulas.h"
 #include "svymath/foundation/constants.h"
 
 namespace {
 
-const double kNaN = std::numeric_limits<double>::quiet_NaN();
+using curve_test::kNaN;
 
 TEST(DegreeOfCurve, PublishedAndEdgeValues) {
   // A one-degree curve on a 100 ft base: 5729.58 ft by the arc definition, 5729.65 ft by the chord one.
@@ -137,20 +137,16 @@ TEST_P(ArcFromTangents, TouchesBothTangentsAndPassesThroughThreePoints) {
   const double R = std::fabs(c.radius);
   EXPECT_EQ(std::fabs(arc.radius), R);
   EXPECT_EQ(arc.radius > 0.0, arc.delta > 0.0);
-  // Both tangent points lie T from the PI, on the tangents, and R from the centre square to the tangent.
-  auto dist = [](const C2dPos& a, const C2dPos& b) { return std::hypot(a.north() - b.north(), a.east() - b.east()); };
+  // Both tangent points lie T from the PI on their tangents, and R from the centre square to the tangent.
   const double tolPos = 1e-9 * (1.0 + std::fabs(c.north));
-  EXPECT_NEAR(dist(pi, arc.start), arc.tangent, tolPos);
-  EXPECT_NEAR(dist(pi, arc.end), arc.tangent, tolPos);
-  EXPECT_NEAR(dist(arc.centre, arc.start), R, tolPos);
-  EXPECT_NEAR(dist(arc.centre, arc.end), R, tolPos);
-  const double inRad = c.azIn * svy_math::units::kDegToRad;
-  const double outRad = c.azOut * svy_math::units::kDegToRad;
-  EXPECT_NEAR((arc.centre.north() - arc.start.north()) * std::cos(inRad) +
-                  (arc.centre.east() - arc.start.east()) * std::sin(inRad),
+  EXPECT_NEAR(curve_test::distance(pi, arc.start), arc.tangent, tolPos);
+  EXPECT_NEAR(curve_test::distance(pi, arc.end), arc.tangent, tolPos);
+  EXPECT_NEAR(curve_test::distance(arc.centre, arc.start), R, tolPos);
+  EXPECT_NEAR(curve_test::distance(arc.centre, arc.end), R, tolPos);
+  const CMathAngle in(c.azIn), out(c.azOut);
+  EXPECT_NEAR((arc.centre.north() - arc.start.north()) * in.getCos() + (arc.centre.east() - arc.start.east()) * in.getSin(),
               0.0, tolPos);
-  EXPECT_NEAR((arc.end.north() - pi.north()) * std::sin(outRad) - (arc.end.east() - pi.east()) * std::cos(outRad), 0.0,
-              tolPos);
+  EXPECT_NEAR((arc.end.north() - pi.north()) * out.getSin() - (arc.end.east() - pi.east()) * out.getCos(), 0.0, tolPos);
   EXPECT_NEAR(arc.length, R * std::fabs(arc.delta) * svy_math::units::kDegToRad, 1e-9 * R);
   // The arc through its start, its midpoint and its end is the same arc.
   const double half = 0.5 * arc.delta * svy_math::units::kDegToRad;
@@ -161,8 +157,7 @@ TEST_P(ArcFromTangents, TouchesBothTangentsAndPassesThroughThreePoints) {
   ASSERT_TRUE(GetArc3PointsParams(arc.start, mid, arc.end, again));
   EXPECT_NEAR(again.radius, arc.radius, 1e-6);
   EXPECT_NEAR(again.delta, arc.delta, 1e-7);
-  EXPECT_NEAR(again.centre.north(), arc.centre.north(), 1e-6);
-  EXPECT_NEAR(again.centre.east(), arc.centre.east(), 1e-6);
+  curve_test::expectPosNear(again.centre, arc.centre.north(), arc.centre.east(), 1e-6);
   EXPECT_NEAR(again.tangent, arc.tangent, 1e-6);
   EXPECT_NEAR(again.external, arc.external, 1e-6);
   EXPECT_NEAR(again.midOrdinate, arc.midOrdinate, 1e-6);
@@ -182,7 +177,7 @@ TEST(ArcFromTangents, RejectsParallelTangentsAndBadInput) {
   EXPECT_FALSE(GetArcTangentParams(C2dPos(0, 0), 30.0, 210.0, 100.0, arc));
   EXPECT_FALSE(GetArcTangentParams(C2dPos(0, 0), 30.0, 60.0, 0.0, arc));
   EXPECT_FALSE(GetArcTangentParams(C2dPos(0, 0), kNaN, 60.0, 100.0, arc));
-  EXPECT_FALSE(GetArcTangentParams(C2dPos(0, std::numeric_limits<double>::infinity()), 0.0, 60.0, 100.0, arc));
+  EXPECT_FALSE(GetArcTangentParams(C2dPos(0, curve_test::kInf), 0.0, 60.0, 100.0, arc));
   EXPECT_EQ(arc.radius, 7.0);
 }
 
@@ -197,8 +192,7 @@ TEST(ArcThroughThreePoints, MajorArcsSidesAndDegenerateInput) {
   ASSERT_TRUE(GetArc3PointsParams(at(0.0), at(150.0), at(300.0), arc));
   EXPECT_NEAR(arc.radius, 10.0, 1e-12);
   EXPECT_NEAR(arc.delta, 300.0, 1e-10);
-  EXPECT_NEAR(arc.centre.north(), 3.0, 1e-12);
-  EXPECT_NEAR(arc.centre.east(), 4.0, 1e-12);
+  curve_test::expectPosNear(arc.centre, 3.0, 4.0, 1e-12);
   EXPECT_NEAR(arc.length, 10.0 * 300.0 * svy_math::units::kDegToRad, 1e-10);
   EXPECT_NEAR(arc.midOrdinate, 10.0 * (1.0 - std::cos(150.0 * svy_math::units::kDegToRad)), 1e-10);
   EXPECT_LT(arc.tangent, 0.0);
