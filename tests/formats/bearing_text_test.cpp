@@ -41,21 +41,16 @@ TEST(DegreeToBearing, ReadsBackToTheAzimuth) {
     const double az = azimuth(random);
     const int decimals = i % 4;
     const std::wstring text = DegreeToBearing(az, decimals).str();
-    wchar_t from = 0;
-    wchar_t toward = 0;
-    int d = 0;
-    int m = 0;
+    wchar_t from = 0, toward = 0;
+    int d = 0, m = 0;
     double s = 0.0;
     ASSERT_EQ(std::swscanf(text.c_str(), L"%lc %d\u00B0%d'%lf\" %lc", &from, &d, &m, &s, &toward), 5) << az;
     ASSERT_LT(m, 60);
     ASSERT_LT(s, 60.0);
-    const double angle = d + m / 60.0 + s / 3600.0;
-    double back = angle;
-    if (from == L'S' && toward == L'E') back = 180.0 - angle;
-    if (from == L'S' && toward == L'W') back = 180.0 + angle;
-    if (from == L'N' && toward == L'W') back = 360.0 - angle;
-    double diff = std::fabs(back - az);
-    diff = std::fmin(diff, 360.0 - diff);
+    // Measured from the north or south point toward the east or west.
+    const double angle = (toward == L'E' ? 1.0 : -1.0) * (d + m / 60.0 + s / 3600.0);
+    const double back = from == L'N' ? angle : 180.0 - angle;
+    const double diff = std::fabs(std::remainder(back - az, 360.0));
     EXPECT_LE(diff, 0.5 * std::pow(10.0, -decimals) / 3600.0 + 1e-12) << az << " " << decimals;
   }
 }
