@@ -151,22 +151,15 @@ TEST(SegmentElement, PlacedByOriginAndAzimuth) {
   EXPECT_FALSE(segment.getCurveIp(ip));  // a straight has parallel end tangents
 }
 
-TEST(SegmentElement, UnplacedElementAnswersNothing) {
+TEST(SegmentElement, UnplacedOrUndefinedElementAnswersNothing) {
   CCurveSegment segment;
-  EXPECT_FALSE(segment.isok());
-  EXPECT_FALSE(segment.isOrgAzOk());
   C2dPos pos(7.0, 8.0);
   EXPECT_FALSE(segment.getPosAtLength(0.0, pos));
   EXPECT_EQ(pos, C2dPos(7.0, 8.0));
   segment.setStartValues(1.0, 2.0, CMathAngle(0.0));
-  EXPECT_TRUE(segment.isOrgAzOk());
-  EXPECT_FALSE(segment.isok());  // the data is still undefined
-  CCurveDataSegment data;
-  data.setFinalNE(3.0, 4.0);
-  segment.setCurve(data);
+  EXPECT_FALSE(segment.isok());  // placed, but the data is still undefined
+  segment.setCurve(curve_test::makeSegment(0.0, 0.0, 0.0, 5.0).getCurve());
   EXPECT_TRUE(segment.isok());
-  EXPECT_NEAR(segment.getEndNorthing(), 4.0, 1e-12);
-  EXPECT_NEAR(segment.getEndEasting(), 6.0, 1e-12);
   segment.resetOrgAz();
   EXPECT_FALSE(segment.isok());
 }
