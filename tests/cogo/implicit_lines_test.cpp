@@ -59,8 +59,8 @@ TEST(ImplicitLines, DefiningPointsLieOnTheLineAndTheFootIsTheProjection) {
     ASSERT_TRUE(FindLinesIntersection(line, perp, foot));
     const Pt d = c[1] - c[0];
     const Pt expected = c[0] + d * (((c[2] - c[0]) * d) / (d * d));
-    EXPECT_NEAR(foot[0], expected[0], 1e-9 * (1.0 + std::fabs(expected[0])));
-    EXPECT_NEAR(foot[1], expected[1], 1e-9 * (1.0 + std::fabs(expected[1])));
+    EXPECT_NEAR(foot[0], expected[0], 1e-9);
+    EXPECT_NEAR(foot[1], expected[1], 1e-9);
   }
 }
 

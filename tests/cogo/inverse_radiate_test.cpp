@@ -115,9 +115,13 @@ TEST(Compute3DPoint, ExtendedPointKeepsTheDirectionOfTheLine) {
       EXPECT_NEAR(std::remainder(az - lineAz - (ahead ? 0.0 : kPi), kTwoPi), 0.0, 1e-10);
       EXPECT_NEAR(zenith, ahead ? lineZenith : kPi - lineZenith, 1e-10);
     }
-    const double back = std::hypot(std::hypot(out.east - c.from.east, out.north - c.from.north),
-                                   out.height - c.from.height);
-    EXPECT_NEAR(back, std::fabs(lineSlope + c.distance), 1e-8);
+    const double dN = out.north - c.from.north, dE = out.east - c.from.east, dZ = out.height - c.from.height;
+    EXPECT_NEAR(std::hypot(std::hypot(dE, dN), dZ), std::fabs(lineSlope + c.distance), 1e-8);
+    if (std::fabs(lineSlope + c.distance) <= 1e-9) {  // the whole line back: the start itself
+      EXPECT_NEAR(dN, 0.0, 1e-9);
+      EXPECT_NEAR(dE, 0.0, 1e-9);
+      EXPECT_NEAR(dZ, 0.0, 1e-12);
+    }
   }
 }
 
