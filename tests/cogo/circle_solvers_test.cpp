@@ -182,8 +182,10 @@ TEST(TwoCircles, TangentCirclesTouchOnceOnTheCentreLine) {
     EXPECT_NEAR(dist(s1, onCircle(c.center1, toward, c.azimuthDeg)), 0.0, 1e-8 + c.r1 * 2e-9 / d);
     EXPECT_EQ(s1, s2);
     const double step = c.internal ? -1e-6 : 1e-6;
-    EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, onCircle(c.center1, d + step, c.azimuthDeg), c.r2, s1, s2), 0);
-    EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, onCircle(c.center1, d - step, c.azimuthDeg), c.r2, s1, s2), 2);
+    const C2dPos apart = onCircle(c.center1, d + step, c.azimuthDeg);
+    const C2dPos across = onCircle(c.center1, d - step, c.azimuthDeg);
+    EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, apart, c.r2, s1, s2), 0);
+    EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, across, c.r2, s1, s2), 2);
   }
 }
 

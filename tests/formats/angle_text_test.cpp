@@ -49,7 +49,8 @@ TEST(AngleTextReading, AcceptsTypedFormsAndLeavesFailuresAlone) {
     double degrees;
   } const cases[] = {
       {L"45\u00B030'15.25\"", true, false, false, kDms}, {L"45:30:15,25", true, false, false, kDms},
-      {L"45d30m15.25s", true, false, false, kDms},        {L" 45\u00B0 30\u2032 15.25\u2033 ", true, false, false, kDms},
+      {L"45d30m15.25s", true, false, false, kDms},
+      {L" 45\u00B0 30\u2032 15.25\u2033 ", true, false, false, kDms},
       {L"-12\u00B005'", true, true, false, -(12.0 + 5.0 / 60)}, {L"+12 5.5", true, true, false, 12.0 + 5.5 / 60},
       {L"45,5", true, true, true, 45.5},  {L".5", true, true, true, 0.5},  {L"45.", true, true, true, 45.0},
       // Rejected forms.

@@ -248,7 +248,8 @@ TEST(AngleText, ParsesThreeFieldsToRadians) {
                      {L"370", L"0", L"0", 10},     {L"12x", L"30", L"0", 0},        {L"12", L"", L"0", 0},
                      {L"12", L"1", L"abc", 0}};
   for (const auto& c : cases)
-    EXPECT_NEAR(AngleToRad(CSvyString(c.d), CSvyString(c.m), CSvyString(c.s)), c.degrees * kPi / 180, 1e-15) << c.degrees;
+    EXPECT_NEAR(AngleToRad(CSvyString(c.d), CSvyString(c.m), CSvyString(c.s)), c.degrees * kPi / 180, 1e-15)
+        << c.degrees;
 }
 
 TEST(AngleText, NegativeMinutesOrSecondsAreLoggedAndUsed) {

@@ -78,40 +78,26 @@ class ArcSetters : public ::testing::TestWithParam<PolarArc> {};
 
 TEST_P(ArcSetters, AllAgreeOnTheSameArc) {
   const PolarArc& ref = GetParam();
-  const bool upToHalf = std::fabs(ref.sweep) <= kPi;
+  const bool cw = ref.clockwise();
   CArc arc;
-
-  ASSERT_TRUE(arc.set_start_center_finish(ref.start(), ref.centre, ref.finish(), ref.clockwise()));
-  expectArc(arc, ref, "start_center_finish");
-
-  ASSERT_TRUE(arc.set_r_start_center_finish(ref.radius, rad(ref.startRadial), ref.centre,
-                                            rad(ref.startRadial + ref.sweep), ref.clockwise()));
-  expectArc(arc, ref, "r_start_center_finish");
-
-  ASSERT_TRUE(arc.set_start_finish_bulge(ref.start(), ref.finish(), std::tan(ref.sweep / 4)));
-  expectArc(arc, ref, "bulge");
-
-  ASSERT_TRUE(arc.set_start_finish_startTgDir(ref.start(), ref.finish(), rad(ref.startTangent())));
-  expectArc(arc, ref, "startTgDir");
-
-  ASSERT_TRUE(arc.set_start_finish_finishTgDir(ref.start(), ref.finish(), rad(ref.finishTangent())));
-  expectArc(arc, ref, "finishTgDir");
-
-  ASSERT_TRUE(arc.set_start_finish_plusPos(ref.start(), ref.finish(), ref.pointAt(ref.startRadial + ref.sweep / 3)));
-  expectArc(arc, ref, "plusPos");
-
-  ASSERT_TRUE(arc.set_start_r_length(ref.start(), rad(ref.startTangent()), ref.radius,
-                                     ref.radius * std::fabs(ref.sweep), ref.clockwise()));
-  expectArc(arc, ref, "r_length");
-
-  if (upToHalf) {
-    ASSERT_TRUE(arc.set_r_start_finish(ref.radius, ref.start(), ref.finish(), ref.clockwise()));
-    expectArc(arc, ref, "r_start_finish");
-    ASSERT_TRUE(arc.set_start_center_cAngle(ref.start(), ref.centre, rad(std::fabs(ref.sweep)), ref.clockwise()));
-    expectArc(arc, ref, "start_center_cAngle");
-    ASSERT_TRUE(arc.set_start_finish_turn(ref.start(), ref.finish(), rad(ref.sweep)));
-    expectArc(arc, ref, "turn");
-  }
+  const auto check = [&](bool set, const char* setter) {
+    ASSERT_TRUE(set) << setter;
+    expectArc(arc, ref, setter);
+  };
+  check(arc.set_start_center_finish(ref.start(), ref.centre, ref.finish(), cw), "start_center_finish");
+  const CMathAngle startRadial = rad(ref.startRadial), finishRadial = rad(ref.startRadial + ref.sweep);
+  check(arc.set_r_start_center_finish(ref.radius, startRadial, ref.centre, finishRadial, cw), "r_start_center_finish");
+  check(arc.set_start_finish_bulge(ref.start(), ref.finish(), std::tan(ref.sweep / 4)), "bulge");
+  check(arc.set_start_finish_startTgDir(ref.start(), ref.finish(), rad(ref.startTangent())), "startTgDir");
+  check(arc.set_start_finish_finishTgDir(ref.start(), ref.finish(), rad(ref.finishTangent())), "finishTgDir");
+  check(arc.set_start_finish_plusPos(ref.start(), ref.finish(), ref.pointAt(ref.startRadial + ref.sweep / 3)),
+        "plusPos");
+  check(arc.set_start_r_length(ref.start(), rad(ref.startTangent()), ref.radius, ref.radius * std::fabs(ref.sweep), cw),
+        "r_length");
+  if (std::fabs(ref.sweep) > kPi) return;  // the remaining setters define arcs up to a half circle
+  check(arc.set_r_start_finish(ref.radius, ref.start(), ref.finish(), cw), "r_start_finish");
+  check(arc.set_start_center_cAngle(ref.start(), ref.centre, rad(std::fabs(ref.sweep)), cw), "start_center_cAngle");
+  check(arc.set_start_finish_turn(ref.start(), ref.finish(), rad(ref.sweep)), "turn");
 }
 
 INSTANTIATE_TEST_SUITE_P(
