@@ -6,7 +6,6 @@
 #include "svymath/curves/curve_projection.h"
 #include "svymath/curves/spiral_length_range.h"
 #include "svymath/foundation/constants.h"
-#include "svyutils/svy_err_log.h"
 
 using svy_math::tol::kZero;
 
@@ -15,12 +14,9 @@ namespace {
 // The kind code of arc data, shared with the alignment's arc element.
 constexpr int kArcDataType = 1;
 
-void logFailure(int line) { svy_logging::svy_err_log(svy_math::kCurvesLogSource, line, ""); }
-
 bool isValidLength(double length) { return length >= 0.0 && std::isfinite(length); }
 
 double withSide(double value, bool toTheRight) { return toTheRight ? std::fabs(value) : -std::fabs(value); }
-
 }  // namespace
 
 CCurveDataArc::CCurveDataArc() { reset(); }
@@ -133,7 +129,7 @@ double CCurveDataArc::getTotalLength() const {
 double CCurveDataArc::getRadius() const {
   double radius = 0.0;
   if (knownRadius(radius)) return radius;
-  logFailure(__LINE__);
+  svy_math::logCurveFailure(__LINE__);
   m_radius = svy_math::tol::kUndefinedArcRadius;
   return m_radius;
 }
@@ -174,10 +170,7 @@ bool CCurveDataArc::getPosAtLength(double s, double& north, double& east) const 
   double radius = 0.0;
   const double length = getTotalLength();
   if (!knownRadius(radius) || std::isnan(length)) return false;
-  if (!svy_math::snapToRange(s, 0.0, length)) {
-    logFailure(__LINE__);
-    return false;
-  }
+  if (!svy_math::checkLengthOrLog(true, s, length, __LINE__)) return false;
   const double turn = turnAt(s);
   north = radius * std::sin(turn);
   east = radius * (1.0 - std::cos(turn));
@@ -192,10 +185,7 @@ double CCurveDataArc::getCurvatureAtLength(double /*s*/) const {
 
 double CCurveDataArc::getStepForDeviation(double s, double dev) const {
   const double length = getTotalLength();
-  if (!svy_math::snapToRange(s, 0.0, length)) {
-    logFailure(__LINE__);
-    return 0.0;
-  }
+  if (!svy_math::checkLengthOrLog(true, s, length, __LINE__)) return 0.0;
   const double rest = length - s;
   double radius = 0.0;
   if (!knownRadius(radius) || std::fabs(radius) < kZero || !(dev > 0.0)) return rest;

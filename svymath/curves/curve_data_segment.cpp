@@ -6,15 +6,11 @@
 #include "svymath/curves/curve_projection.h"
 #include "svymath/curves/spiral_length_range.h"
 #include "svymath/foundation/constants.h"
-#include "svyutils/svy_err_log.h"
 
 namespace {
 
 // The kind code of segment data, shared with the alignment's tangent element.
 constexpr int kSegmentDataType = 0;
-
-void logFailure(int line) { svy_logging::svy_err_log(svy_math::kCurvesLogSource, line, ""); }
-
 }  // namespace
 
 CCurveDataSegment::CCurveDataSegment() { reset(); }
@@ -105,14 +101,7 @@ double CCurveDataSegment::GetAzimuth(double /*s*/) const {
 }
 
 bool CCurveDataSegment::getPosAtLength(double s, double& north, double& east) const {
-  if (!isok()) {
-    logFailure(__LINE__);
-    return false;
-  }
-  if (!svy_math::snapToRange(s, 0.0, m_length)) {
-    logFailure(__LINE__);
-    return false;
-  }
+  if (!svy_math::checkLengthOrLog(isok(), s, m_length, __LINE__)) return false;
   north = s * cosAz();
   east = s * sinAz();
   return true;

@@ -4,15 +4,8 @@
 
 #include "svymath/curves/spiral_length_range.h"
 #include "svymath/foundation/constants.h"
-#include "svyutils/svy_err_log.h"
 
 using svy_math::tol::kZero;
-
-namespace {
-
-void logFailure(int line) { svy_logging::svy_err_log(svy_math::kCurvesLogSource, line, ""); }
-
-}  // namespace
 
 CCurveDataSpiral::CCurveDataSpiral(AlntMathSpiralType type) : CCurveDataSpiral1R(type) {}
 
@@ -75,7 +68,7 @@ double CCurveDataSpiral::GetAzimuth(double s) const {
 }
 
 bool CCurveDataSpiral::getPosAtLength(double s, double& north, double& east) const {
-  if (!checkLength(s)) return false;
+  if (!svy_math::checkLengthOrLog(m_law->isok(), s, getTotalLength(), __LINE__)) return false;
   if (!m_isTSSC) return fullPosAtLength(s, north, east);
   double n = 0.0;
   double e = 0.0;
@@ -94,10 +87,7 @@ double CCurveDataSpiral::getCurvatureAtLength(double s) const {
 
 double CCurveDataSpiral::getStepForDeviation(double s, double dev) const {
   const double total = getTotalLength();
-  if (!svy_math::snapToRange(s, 0.0, total)) {
-    logFailure(__LINE__);
-    return 0.0;
-  }
+  if (!svy_math::checkLengthOrLog(true, s, total, __LINE__)) return 0.0;
   if (!(dev > 0.0)) return total - s;
   if (m_isTSSC) return fullStepForDeviation(s + m_startOffset, dev, m_law->getLength());
   return fullStepForDeviation(s, dev, total);

@@ -6,7 +6,6 @@
 #include "svymath/curves/spiral_factory.h"
 #include "svymath/curves/spiral_length_range.h"
 #include "svymath/foundation/constants.h"
-#include "svyutils/svy_err_log.h"
 
 using svy_math::tol::kProjectionLength;
 using svy_math::tol::kZero;
@@ -29,11 +28,8 @@ constexpr double kStepRelTol = 1e-9;
 constexpr int kStepMaxHalvings = 64;
 constexpr int kStepMaxBisections = 64;
 
-void logFailure(int line) { svy_logging::svy_err_log(svy_math::kCurvesLogSource, line, ""); }
-
 // A radius value that stands for the tangent: zero, infinite or undefined.
 bool isTangentRadius(double r) { return !(std::fabs(r) >= kZero) || std::isinf(r); }
-
 }  // namespace
 
 CCurveDataSpiral1R::CCurveDataSpiral1R(AlntMathSpiralType type) : m_law(svy_math::createSpiralLaw(type)) {}
@@ -152,20 +148,8 @@ bool CCurveDataSpiral1R::fullPosAtLength(double s, double& north, double& east) 
   return true;
 }
 
-bool CCurveDataSpiral1R::checkLength(double& s) const {
-  if (!m_law->isok()) {
-    logFailure(__LINE__);
-    return false;
-  }
-  if (!svy_math::snapToRange(s, 0.0, getTotalLength())) {
-    logFailure(__LINE__);
-    return false;
-  }
-  return true;
-}
-
 bool CCurveDataSpiral1R::getPosAtLength(double s, double& north, double& east) const {
-  return checkLength(s) && fullPosAtLength(s, north, east);
+  return svy_math::checkLengthOrLog(m_law->isok(), s, getTotalLength(), __LINE__) && fullPosAtLength(s, north, east);
 }
 
 double CCurveDataSpiral1R::getCurvatureAtLength(double s) const {
@@ -202,10 +186,7 @@ double CCurveDataSpiral1R::fullStepForDeviation(double s, double dev, double lim
 
 double CCurveDataSpiral1R::getStepForDeviation(double s, double dev) const {
   const double total = getTotalLength();
-  if (!svy_math::snapToRange(s, 0.0, total)) {
-    logFailure(__LINE__);
-    return 0.0;
-  }
+  if (!svy_math::checkLengthOrLog(true, s, total, __LINE__)) return 0.0;
   if (!(dev > 0.0)) return total - s;
   return fullStepForDeviation(s, dev, total);
 }

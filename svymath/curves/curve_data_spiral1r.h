@@ -120,8 +120,6 @@ class SVYMATH_API CCurveDataSpiral1R {
   bool componentsAt(double north, double east, double s, double& along, double& offset) const;
   // Law length s of element length s (the law runs backwards under a CS-to-ST element).
   double lawLength(double s) const { return m_isTSSC ? s : m_law->getLength() - s; }
-  // True for defined data and s within [0, total length] after the snap (s snapped); logged otherwise.
-  bool checkLength(double& s) const;
   // Position of the full spiral at element length s without the range check.
   bool fullPosAtLength(double s, double& north, double& east) const;
   // The largest step from full-spiral element length s within dev, not past limit (element length).

@@ -4,7 +4,6 @@
 
 #include "svymath/curves/spiral_length_range.h"
 #include "svymath/foundation/constants.h"
-#include "svyutils/svy_err_log.h"
 
 using svy_math::tol::kZero;
 
@@ -54,9 +53,6 @@ double xByLength(double a, double s) {
 
 // Radius-to-length ratio of the unit parabola at normalised length s.
 double unitRatio(double s) { return CCubicSpiralTStoSC::calcRByL(1.0, s) / s; }
-
-void logFailure(int line) { svy_logging::svy_err_log(svy_math::kCurvesLogSource, line, ""); }
-
 }  // namespace
 
 CCubicSpiralTStoSC::CCubicSpiralTStoSC()
@@ -196,14 +192,7 @@ double CCubicSpiralTStoSC::getCurvatureAtLength(double s) const {
 }
 
 bool CCubicSpiralTStoSC::getPosAtLength(double s, double& north, double& east) const {
-  if (!isok()) {
-    logFailure(__LINE__);
-    return false;
-  }
-  if (!svy_math::snapToRange(s, 0.0, m_length)) {
-    logFailure(__LINE__);
-    return false;
-  }
+  if (!svy_math::checkLengthOrLog(isok(), s, m_length, __LINE__)) return false;
   if (isDegenerate()) {
     north = 0.0;
     east = 0.0;

@@ -5,7 +5,6 @@
 #include "svymath/curves/spiral_fresnel.h"
 #include "svymath/curves/spiral_length_range.h"
 #include "svymath/foundation/constants.h"
-#include "svyutils/svy_err_log.h"
 
 using svy_math::tol::kZero;
 
@@ -59,14 +58,7 @@ double CEulerSpiralTStoSC::getCurvatureAtLength(double s) const {
 }
 
 bool CEulerSpiralTStoSC::getPosAtLength(double s, double& north, double& east) const {
-  if (!isok()) {
-    svy_logging::svy_err_log(svy_math::kCurvesLogSource, __LINE__, "");
-    return false;
-  }
-  if (!svy_math::snapToRange(s, 0.0, m_length)) {
-    svy_logging::svy_err_log(svy_math::kCurvesLogSource, __LINE__, "");
-    return false;
-  }
+  if (!svy_math::checkLengthOrLog(isok(), s, m_length, __LINE__)) return false;
   if (isDegenerate()) {
     north = 0.0;
     east = 0.0;

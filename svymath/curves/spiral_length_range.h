@@ -13,4 +13,11 @@ constexpr const char* kCurvesLogSource = "mathCurves";
 // Returns true when lo <= value <= hi afterwards (so false for NaN). The value is changed only by a snap.
 SVYMATH_API bool snapToRange(double& value, double lo, double hi);
 
+// Reports an unexpected state of the curve code to the error log at the caller's line.
+SVYMATH_API void logCurveFailure(int line);
+
+// The guard of the length queries: true when the data is defined and s lies in [0, length] after snapToRange
+// (s snapped); otherwise false, with one log entry at the caller's line.
+SVYMATH_API bool checkLengthOrLog(bool defined, double& s, double length, int line);
+
 }  // namespace svy_math
