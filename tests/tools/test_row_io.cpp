@@ -173,6 +173,16 @@ TEST(RunRows, BadRowsReportedGoodRowsWritten) {
                  "svy: line 5: x: 'abc' is not a number\n");
 }
 
+TEST(ParseNumberList, ExactlyTheGivenCount) {
+  std::vector<double> values;
+  EXPECT_TRUE(svy_tool::parseNumberList("5000.5, -2000", 2, values));
+  EXPECT_EQ(values, (std::vector<double>{5000.5, -2000.0}));
+  EXPECT_FALSE(svy_tool::parseNumberList("5000.5", 2, values));
+  EXPECT_FALSE(svy_tool::parseNumberList("1,2,3", 2, values));
+  EXPECT_FALSE(svy_tool::parseNumberList("1,x", 2, values));
+  EXPECT_EQ(values.size(), 2u);  // untouched on failure
+}
+
 TEST(RunRows, OptionalTrailingInputs) {
   std::istringstream in("1\n1,2\n1,2,3,4\n");
   std::ostringstream out;

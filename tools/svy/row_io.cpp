@@ -12,6 +12,7 @@
 #include <fstream>
 #include <iostream>
 #include <system_error>
+#include <utility>
 
 namespace svy_tool {
 
@@ -269,6 +270,34 @@ void reportBadRow(std::size_t lineNumber, const std::string& message) {
   std::cerr << "svy: line " << lineNumber << ": " << message << '\n';
 }
 
+bool checkRow(const RowFormat& format, InputRow& row, std::string& error) {
+  if (!fieldCountFits(format, row.fields.size())) {
+    error = fieldCountMessage(format, row.fields.size());
+    return false;
+  }
+  row.numbers.clear();
+  if (!format.numericInput) return true;
+  row.numbers.resize(row.fields.size());
+  for (std::size_t i = 0; i < row.fields.size(); ++i) {
+    if (!parseNumber(row.fields[i], row.numbers[i])) {
+      error = format.inputs[i] + ": '" + row.fields[i] + "' is not a number";
+      return false;
+    }
+  }
+  return true;
+}
+
+bool parseNumberList(const std::string& text, std::size_t count, std::vector<double>& values) {
+  const std::vector<std::string> fields = splitCsv(text);
+  std::vector<double> parsed(fields.size());
+  if (fields.size() != count) return false;
+  for (std::size_t i = 0; i < fields.size(); ++i) {
+    if (!parseNumber(fields[i], parsed[i])) return false;
+  }
+  values = std::move(parsed);
+  return true;
+}
+
 int runRows(std::istream& in, std::ostream& out, const RowFormat& format, const OutputOptions& options,
             const RowHandler& handler) {
   RowReader reader(in, format.inputs, format.numericInput);
@@ -278,28 +307,9 @@ int runRows(std::istream& in, std::ostream& out, const RowFormat& format, const 
   std::vector<Cell> cells;
   std::string error;
   while (reader.next(row)) {
-    if (!fieldCountFits(format, row.fields.size())) {
-      reportBadRow(row.lineNumber, fieldCountMessage(format, row.fields.size()));
-      status = kExitBadRows;
-      continue;
-    }
-    bool numbersOk = true;
-    if (format.numericInput) {
-      row.numbers.resize(row.fields.size());
-      for (std::size_t i = 0; i < row.fields.size() && numbersOk; ++i) {
-        if (!parseNumber(row.fields[i], row.numbers[i])) {
-          reportBadRow(row.lineNumber, format.inputs[i] + ": '" + row.fields[i] + "' is not a number");
-          numbersOk = false;
-        }
-      }
-    }
-    if (!numbersOk) {
-      status = kExitBadRows;
-      continue;
-    }
     cells.clear();
     error.clear();
-    if (!handler(row, cells, error)) {
+    if (!checkRow(format, row, error) || !handler(row, cells, error)) {
       reportBadRow(row.lineNumber, error.empty() ? "no result" : error);
       status = kExitBadRows;
       continue;

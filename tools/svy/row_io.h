@@ -153,6 +153,14 @@ struct RowFormat {
   std::size_t requiredInputs = 0;
 };
 
+// Checks a row against the format: its field count and, for numeric input, that every field is a number
+// (filling row.numbers). On failure sets the bad-row message ("expected 2 numbers, got 3") and returns false.
+// runRows() applies it to every row; verbs that read all rows first call it themselves.
+bool checkRow(const RowFormat& format, InputRow& row, std::string& error);
+
+// Parses an option value of comma-separated numbers ("5000,2000" for N,E) into exactly `count` numbers.
+bool parseNumberList(const std::string& text, std::size_t count, std::vector<double>& values);
+
 // Computes one row: fills the output cells and returns true, or sets the message and returns false.
 using RowHandler = std::function<bool(const InputRow& row, std::vector<Cell>& out, std::string& error)>;
 
