@@ -36,7 +36,9 @@ inline C2dPos posAt(const CGenericSegment& segment, double s) {
   return pos;
 }
 
-inline double distance(const C2dPos& a, const C2dPos& b) { return std::hypot(a.north() - b.north(), a.east() - b.east()); }
+inline double distance(const C2dPos& a, const C2dPos& b) {
+  return std::hypot(a.north() - b.north(), a.east() - b.east());
+}
 
 // An arc element starting at (north, east) heading azimuthDeg, of the given length and radius magnitude.
 inline CCurveArc makeArc(double north, double east, double azDeg, double length, double radius, bool toTheRight) {
@@ -53,24 +55,17 @@ inline CCurveSegment makeSegment(double north, double east, double azDeg, double
 }
 
 // A full spiral element of length L to radius R.
-inline CCurveSpiral makeSpiral(double north, double east, double azDeg, double length, double radius,
-                               bool toTheRight, bool isTSSC, AlntMathSpiralType law = eMathSpiralEuler) {
+inline CCurveSpiral makeSpiral(double north, double east, double azDeg, double length, double radius, bool toTheRight,
+                               bool isTSSC, AlntMathSpiralType law = eMathSpiralEuler) {
   CCurveDataSpiral data(law);
   data.setLenAndR(length, radius, toTheRight, isTSSC);
   return CCurveSpiral(north, east, azimuthDeg(azDeg), data);
 }
 
-// A partial spiral element of length L between the radii r1 and r2.
-inline CCurveSpiral makePartialSpiral(double north, double east, double azDeg, double length, double r1, double r2,
-                                      bool toTheRight, bool isTSSC) {
-  CCurveDataSpiral data(eMathSpiralEuler);
-  data.setLenAndTwoR(length, r1, r2, toTheRight, isTSSC);
-  return CCurveSpiral(north, east, azimuthDeg(azDeg), data);
-}
-
 // Smallest distance from p to the segment over a dense sampling of its length (an independent oracle for
 // projections), with the sampled length of the nearest sample.
-inline double sampledDistance(const CGenericSegment& segment, const C2dPos& p, int samples, double* atLength = nullptr) {
+inline double sampledDistance(const CGenericSegment& segment, const C2dPos& p, int samples,
+                              double* atLength = nullptr) {
   double best = std::numeric_limits<double>::infinity();
   const double total = segment.getTotalLength();
   for (int i = 0; i <= samples; ++i) {

@@ -139,13 +139,12 @@ TEST_P(ArcRoundTripTest, PositionThenLengthAndOffsetGivesThemBack) {
   EXPECT_NEAR(dist, c.offset, 1e-8);
 }
 
-INSTANTIATE_TEST_SUITE_P(Table, ArcRoundTripTest,
-                         ::testing::Values(ArcRoundTrip{100.0, true, 50.0, 0.0, 3.0}, ArcRoundTrip{100.0, true, 50.0, 50.0, -3.0},
-                                           ArcRoundTrip{100.0, false, 50.0, 20.0, 3.0},
-                                           ArcRoundTrip{100.0, false, 50.0, 20.0, -60.0},
-                                           ArcRoundTrip{30.0, true, 150.0, 140.0, 10.0},  // more than a half turn
-                                           ArcRoundTrip{30.0, false, 180.0, 100.0, -5.0},
-                                           ArcRoundTrip{5000.0, true, 400.0, 399.0, 0.25}));
+INSTANTIATE_TEST_SUITE_P(
+    Table, ArcRoundTripTest,
+    ::testing::Values(ArcRoundTrip{100.0, true, 50.0, 0.0, 3.0}, ArcRoundTrip{100.0, true, 50.0, 50.0, -3.0},
+                      ArcRoundTrip{100.0, false, 50.0, 20.0, 3.0}, ArcRoundTrip{100.0, false, 50.0, 20.0, -60.0},
+                      ArcRoundTrip{30.0, true, 150.0, 140.0, 10.0},  // more than a half turn
+                      ArcRoundTrip{30.0, false, 180.0, 100.0, -5.0}, ArcRoundTrip{5000.0, true, 400.0, 399.0, 0.25}));
 
 TEST(ArcElement, CentreQueryAndSignedDistanceToTheCircle) {
   for (const bool right : {true, false}) {

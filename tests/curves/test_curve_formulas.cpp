@@ -110,8 +110,7 @@ TEST_P(CurveRoundTrip, QuantitiesSatisfyCircleGeometry) {
 
 INSTANTIATE_TEST_SUITE_P(Cases, CurveRoundTrip,
                          ::testing::Values(CurveCase{100.0, 90.0}, CurveCase{300.0, 12.5}, CurveCase{1500.0, 0.8},
-                                           CurveCase{50.0, 150.0}, CurveCase{5729.58, 33.0},
-                                           CurveCase{25.0, 179.0}));
+                                           CurveCase{50.0, 150.0}, CurveCase{5729.58, 33.0}, CurveCase{25.0, 179.0}));
 
 TEST(SpiralFormulas, LengthAndConstantRoundTrip) {
   for (double L : {20.0, 80.0, 150.0}) {
@@ -144,13 +143,15 @@ TEST_P(ArcFromTangents, TouchesBothTangentsAndPassesThroughThreePoints) {
   EXPECT_NEAR(curve_test::distance(arc.centre, arc.start), R, tolPos);
   EXPECT_NEAR(curve_test::distance(arc.centre, arc.end), R, tolPos);
   const CMathAngle in(c.azIn), out(c.azOut);
-  EXPECT_NEAR((arc.centre.north() - arc.start.north()) * in.getCos() + (arc.centre.east() - arc.start.east()) * in.getSin(),
-              0.0, tolPos);
+  EXPECT_NEAR(
+      (arc.centre.north() - arc.start.north()) * in.getCos() + (arc.centre.east() - arc.start.east()) * in.getSin(),
+      0.0, tolPos);
   EXPECT_NEAR((arc.end.north() - pi.north()) * out.getSin() - (arc.end.east() - pi.east()) * out.getCos(), 0.0, tolPos);
   EXPECT_NEAR(arc.length, R * std::fabs(arc.delta) * svy_math::units::kDegToRad, 1e-9 * R);
   // The arc through its start, its midpoint and its end is the same arc.
   const double half = 0.5 * arc.delta * svy_math::units::kDegToRad;
-  const double startFromCentre = std::atan2(arc.start.east() - arc.centre.east(), arc.start.north() - arc.centre.north());
+  const double startFromCentre =
+      std::atan2(arc.start.east() - arc.centre.east(), arc.start.north() - arc.centre.north());
   const C2dPos mid(arc.centre.north() + R * std::cos(startFromCentre + half),
                    arc.centre.east() + R * std::sin(startFromCentre + half));
   TArcParams again;

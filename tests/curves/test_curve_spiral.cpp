@@ -184,7 +184,8 @@ TEST_P(SpiralData, ProjectionIsTheNearestPointOfTheSampledSpiral) {
       if (len > 1e-6 && len < total - 1e-6) {
         CMathAngle tangent;
         ASSERT_TRUE(spiral.getAzimuthAtLength(len, tangent));
-        const double along = tangent.getCos() * (p.north() - foot.north()) + tangent.getSin() * (p.east() - foot.east());
+        const double along =
+            tangent.getCos() * (p.north() - foot.north()) + tangent.getSin() * (p.east() - foot.east());
         EXPECT_LT(std::fabs(along), 1e-9);
       }
     }
@@ -206,21 +207,20 @@ TEST_P(SpiralData, BoundaryHoldsDenseSamples) {
   EXPECT_NEAR(box.maxEast - box.minEast, sampled.maxEast - sampled.minEast, 1e-4);
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Cases, SpiralData,
-    ::testing::Values(SpiralCase{eMathSpiralEuler, true, true, 100.0, 300.0, 0.0},
-                      SpiralCase{eMathSpiralEuler, false, true, 100.0, 300.0, 0.0},
-                      SpiralCase{eMathSpiralEuler, true, false, 80.0, 450.0, 0.0},
-                      SpiralCase{eMathSpiralEuler, false, false, 80.0, 450.0, 0.0},
-                      SpiralCase{eMathSpiralEuler, true, true, 150.0, 60.0, 0.0},
-                      SpiralCase{eMathSpiralEuler, true, true, 100.0, 1000.0, 300.0},
-                      SpiralCase{eMathSpiralEuler, false, false, 100.0, 1000.0, 300.0},
-                      SpiralCase{eMathSpiralEuler, false, true, 60.0, 250.0, 900.0},
-                      SpiralCase{eMathSpiralCubic, true, true, 100.0, 400.0, 0.0},
-                      SpiralCase{eMathSpiralCubic, false, false, 100.0, 400.0, 0.0},
-                      SpiralCase{eMathSpiralCubic, true, false, 60.0, 1000.0, 350.0},
-                      SpiralCase{eMathSpiralCubic, false, true, 60.0, 1000.0, 350.0}),
-    [](const ::testing::TestParamInfo<SpiralCase>& caseInfo) { return describe(caseInfo.param); });
+INSTANTIATE_TEST_SUITE_P(Cases, SpiralData,
+                         ::testing::Values(SpiralCase{eMathSpiralEuler, true, true, 100.0, 300.0, 0.0},
+                                           SpiralCase{eMathSpiralEuler, false, true, 100.0, 300.0, 0.0},
+                                           SpiralCase{eMathSpiralEuler, true, false, 80.0, 450.0, 0.0},
+                                           SpiralCase{eMathSpiralEuler, false, false, 80.0, 450.0, 0.0},
+                                           SpiralCase{eMathSpiralEuler, true, true, 150.0, 60.0, 0.0},
+                                           SpiralCase{eMathSpiralEuler, true, true, 100.0, 1000.0, 300.0},
+                                           SpiralCase{eMathSpiralEuler, false, false, 100.0, 1000.0, 300.0},
+                                           SpiralCase{eMathSpiralEuler, false, true, 60.0, 250.0, 900.0},
+                                           SpiralCase{eMathSpiralCubic, true, true, 100.0, 400.0, 0.0},
+                                           SpiralCase{eMathSpiralCubic, false, false, 100.0, 400.0, 0.0},
+                                           SpiralCase{eMathSpiralCubic, true, false, 60.0, 1000.0, 350.0},
+                                           SpiralCase{eMathSpiralCubic, false, true, 60.0, 1000.0, 350.0}),
+                         [](const ::testing::TestParamInfo<SpiralCase>& caseInfo) { return describe(caseInfo.param); });
 
 TEST(SpiralElement, PointsBeyondTheEndsRunOnAlongTheEndTangents) {
   CCurveSpiral spiral = makeSpiral(0.0, 0.0, 0.0, 100.0, 300.0, true, true);
@@ -312,14 +312,15 @@ TEST(SpiralPublished, MatchesPublishedClothoidTables) {
   const struct {
     const char* name;
     double r1, r2;
-  } tables[] = {{"1000_300", 1000.0, 300.0}, {"300_1000", 300.0, 1000.0}, {"-1000_-300", -1000.0, -300.0},
-                {"-300_-1000", -300.0, -1000.0}, {"inf_300", kInf, 300.0}, {"300_inf", 300.0, kInf},
-                {"-inf_-300", -kInf, -300.0}, {"-300_-inf", -300.0, -kInf}};
+  } tables[] = {{"1000_300", 1000.0, 300.0},     {"300_1000", 300.0, 1000.0}, {"-1000_-300", -1000.0, -300.0},
+                {"-300_-1000", -300.0, -1000.0}, {"inf_300", kInf, 300.0},    {"300_inf", 300.0, kInf},
+                {"-inf_-300", -kInf, -300.0},    {"-300_-inf", -300.0, -kInf}};
   for (const auto& t : tables) {
     SCOPED_TRACE(t.name);
     CCurveDataSpiral data;
     ASSERT_TRUE(data.setLenAndTwoR(100.0, t.r1, t.r2, t.r1 < 0.0 || t.r2 < 0.0, std::fabs(t.r2) < std::fabs(t.r1)));
-    const auto local = curve_test::readNumericTable(svy_test::refdataPath(rail + "Clothoid_100.0_" + t.name + "_1_Meter.txt"), 0);
+    const auto local =
+        curve_test::readNumericTable(svy_test::refdataPath(rail + "Clothoid_100.0_" + t.name + "_1_Meter.txt"), 0);
     ASSERT_EQ(local.size(), 101u);
     for (const auto& row : local) {
       double n = 0.0, e = 0.0;
@@ -328,8 +329,8 @@ TEST(SpiralPublished, MatchesPublishedClothoidTables) {
       EXPECT_NEAR(e, -row[2], 1e-9) << row[0];
     }
     const CCurveSpiral spiral(0.0, 0.0, CMathAngle(90.0), data);
-    const auto world =
-        curve_test::readNumericTable(svy_test::refdataPath(guide + "Horizontal_Clothoid_100.0_" + t.name + "_Meter.csv"));
+    const auto world = curve_test::readNumericTable(
+        svy_test::refdataPath(guide + "Horizontal_Clothoid_100.0_" + t.name + "_Meter.csv"));
     ASSERT_GT(world.size(), 10u);
     for (const auto& row : world) {
       SCOPED_TRACE(row[0]);

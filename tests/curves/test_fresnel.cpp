@@ -37,8 +37,8 @@ TEST_P(FresnelQuadrature, MatchesAdaptiveSimpson) {
 }
 
 INSTANTIATE_TEST_SUITE_P(BothRegimes, FresnelQuadrature,
-                         ::testing::Values(1e-6, 0.01, 0.3, 0.75, 1.0, 1.2, 1.4999, 1.5, 1.5001, 1.7, 2.0,
-                                           2.5, 3.3, 4.0, 5.5, -0.6, -1.5, -2.2));
+                         ::testing::Values(1e-6, 0.01, 0.3, 0.75, 1.0, 1.2, 1.4999, 1.5, 1.5001, 1.7, 2.0, 2.5, 3.3,
+                                           4.0, 5.5, -0.6, -1.5, -2.2));
 
 TEST(FresnelTable, MatchesTwentyDigitValues) {
   const auto rows = curve_test::readNumericTable(svy_test::testdataPath("curves/fresnel_CS_table.csv"));

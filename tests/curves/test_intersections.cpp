@@ -73,8 +73,8 @@ INSTANTIATE_TEST_SUITE_P(
         LineLineCase{C2dPos(0, 0), C2dPos(4.9995, 4.9995), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegmentTol, 1,
                      C2dPos(5, 5)},
         // survey coordinates
-        LineLineCase{C2dPos(5000000, 500000), C2dPos(5000100, 500100), C2dPos(5000000, 500100),
-                     C2dPos(5000100, 500000), eIntersectOnSegment, 1, C2dPos(5000050, 500050)}));
+        LineLineCase{C2dPos(5000000, 500000), C2dPos(5000100, 500100), C2dPos(5000000, 500100), C2dPos(5000100, 500000),
+                     eIntersectOnSegment, 1, C2dPos(5000050, 500050)}));
 
 TEST(LineArcIntersection, TwoCrossingsTangencyMissAndSweep) {
   const CCurveArc circleArc = makeArc(0.0, 0.0, 0.0, 100.0, 50.0, true);  // centre (0, 50)
@@ -116,7 +116,7 @@ TEST(LineArcIntersection, EveryCrossingLiesOnBothPieces) {
 TEST(ArcArcIntersection, TwoCrossingsTangencyAndMiss) {
   const double circle = 2.0 * svy_math::units::kPi * 50.0;
   // Two circles of radius 50 with centres 60 apart cross at 40 from the line of centres.
-  const CCurveArc a = makeArc(0.0, -50.0, 0.0, circle, 50.0, true);   // centre (0, 0)
+  const CCurveArc a = makeArc(0.0, -50.0, 0.0, circle, 50.0, true);    // centre (0, 0)
   const CCurveArc b = makeArc(0.0, 110.0, 180.0, circle, 50.0, true);  // centre (0, 60)
   const svy_vector<C2dPos> hits = crossings(a, b);
   ASSERT_EQ(hits.size(), 2u);

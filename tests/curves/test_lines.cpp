@@ -44,12 +44,13 @@ TEST_P(LineExtentTest, AcceptsLengthsByIntersectionType) {
 
 INSTANTIATE_TEST_SUITE_P(
     Table, LineExtentTest,
-    ::testing::Values(ExtentCase{eIntersectOnSegment, -0.0005, false}, ExtentCase{eIntersectOnSegmentTol, -0.0005, true},
-                      ExtentCase{eIntersectUnbounded, -0.0005, true}, ExtentCase{eIntersectOnSegment, 0.0, true},
-                      ExtentCase{eIntersectOnSegment, 100.0, true}, ExtentCase{eIntersectOnSegmentTol, 100.0009, true},
-                      ExtentCase{eIntersectOnSegmentTol, 100.0011, false}, ExtentCase{eIntersectOnSegmentTol, -0.002, false},
-                      ExtentCase{eIntersectUnbounded, -1e6, true}, ExtentCase{eIntersectUnbounded, 1e9, true},
-                      ExtentCase{eIntersectOnSegment, 50.0, true}));
+    ::testing::Values(ExtentCase{eIntersectOnSegment, -0.0005, false},
+                      ExtentCase{eIntersectOnSegmentTol, -0.0005, true}, ExtentCase{eIntersectUnbounded, -0.0005, true},
+                      ExtentCase{eIntersectOnSegment, 0.0, true}, ExtentCase{eIntersectOnSegment, 100.0, true},
+                      ExtentCase{eIntersectOnSegmentTol, 100.0009, true},
+                      ExtentCase{eIntersectOnSegmentTol, 100.0011, false},
+                      ExtentCase{eIntersectOnSegmentTol, -0.002, false}, ExtentCase{eIntersectUnbounded, -1e6, true},
+                      ExtentCase{eIntersectUnbounded, 1e9, true}, ExtentCase{eIntersectOnSegment, 50.0, true}));
 
 struct RoundTripCase {
   double north;
@@ -79,7 +80,8 @@ TEST_P(LineRoundTripTest, PositionThenLengthAndOffsetGivesThemBack) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Table, LineRoundTripTest,
-                         ::testing::Values(RoundTripCase{0.0, 0.0, 0.0, 10.0, 2.5}, RoundTripCase{0.0, 0.0, 90.0, 0.0, -4.0},
+                         ::testing::Values(RoundTripCase{0.0, 0.0, 0.0, 10.0, 2.5},
+                                           RoundTripCase{0.0, 0.0, 90.0, 0.0, -4.0},
                                            RoundTripCase{10.0, -5.0, 180.0, 250.0, 1.0},
                                            RoundTripCase{0.0, 0.0, -90.0, 125.0, 0.0},
                                            RoundTripCase{5000000.0, 500000.0, 37.25, 77.7, -12.3},
@@ -209,7 +211,8 @@ TEST(SegmentRtti, CastFollowsTheHierarchyAndClonesKeepTheirKind) {
   ASSERT_NE(CCurveArc::cast(arcCopy.get()), nullptr);
   EXPECT_EQ(arcCopy->getIntersectionType(), eIntersectUnbounded);
   EXPECT_EQ(arcCopy->getEndPos(), arc.getEndPos());
-  const std::unique_ptr<CGenericSegment> spiralCopy(curve_test::makeSpiral(1.0, 2.0, 3.0, 60.0, 300.0, true, false).clone());
+  const std::unique_ptr<CGenericSegment> spiralCopy(
+      curve_test::makeSpiral(1.0, 2.0, 3.0, 60.0, 300.0, true, false).clone());
   ASSERT_NE(CCurveSpiral::cast(spiralCopy.get()), nullptr);
   EXPECT_EQ(spiralCopy->getEndPos(), segments[4]->getEndPos());
   EXPECT_EQ(TLine::cast(segments[1].get()), nullptr);

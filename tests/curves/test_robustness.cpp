@@ -55,8 +55,10 @@ TEST(CurveRange, SnapsWithinAMillimetreAndLogsBeyond) {
     double total;
     PosFn pos;
   };
-  const Case cases[] = {{"clothoid", 80.0, localPos(clothoid)},     {"cubic", 100.0, localPos(cubic)},
-                        {"partial spiral", 100.0, localPos(part)}, {"tangent data", 20.0, localPos(tangent)},
+  const Case cases[] = {{"clothoid", 80.0, localPos(clothoid)},
+                        {"cubic", 100.0, localPos(cubic)},
+                        {"partial spiral", 100.0, localPos(part)},
+                        {"tangent data", 20.0, localPos(tangent)},
                         {"arc element", 100.0, elementPos(arc)}};
   for (const Case& c : cases) {
     SCOPED_TRACE(c.name);
@@ -121,14 +123,12 @@ TEST(CurveRobustness, LawsAndSpiralDataEndOnAbsurdInput) {
     for (const double x : {kNaN, kInf, -kInf, 1e300, -1e300, 1e-300, 0.0}) {
       SCOPED_TRACE(x);
       int index = 0;
-      for (const std::function<bool()>& define :
-           std::vector<std::function<bool()>>{[&] { return law->setLenAndR(x, 300.0, true); },
-                                              [&] { return law->setLenAndR(100.0, x, true); },
-                                              [&] { return law->setLenAndTwoR(x, 1000.0, 300.0, true); },
-                                              [&] { return law->setLenAndTwoR(60.0, x, 300.0, true); },
-                                              [&] { return law->setLenAndTwoR(60.0, 1000.0, x, true); },
-                                              [&] { return law->setLenAndSpPrm(x, 30000.0); },
-                                              [&] { return law->setLenAndSpPrm(100.0, x); }}) {
+      for (const std::function<bool()>& define : std::vector<std::function<bool()>>{
+               [&] { return law->setLenAndR(x, 300.0, true); }, [&] { return law->setLenAndR(100.0, x, true); },
+               [&] { return law->setLenAndTwoR(x, 1000.0, 300.0, true); },
+               [&] { return law->setLenAndTwoR(60.0, x, 300.0, true); },
+               [&] { return law->setLenAndTwoR(60.0, 1000.0, x, true); },
+               [&] { return law->setLenAndSpPrm(x, 30000.0); }, [&] { return law->setLenAndSpPrm(100.0, x); }}) {
         // A cubic defined by length and radius is usable when the definition says so (the clothoid takes any).
         const bool defined = define();
         EXPECT_FALSE(type == eMathSpiralCubic && index++ < 2 && defined && !law->isok());

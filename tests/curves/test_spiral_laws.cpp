@@ -115,8 +115,7 @@ constexpr double kMinRatio = 1.4416123478778036;
 enum Col { kL, kR, kA, kS, kX, kY, kTangent, kCurvature };
 
 TEST(CubicTable, MatchesExactArcLengthParabola) {
-  const auto rows =
-      curve_test::readNumericTable(svy_test::testdataPath("curves/cubic_parabola_exact_arclength.csv"));
+  const auto rows = curve_test::readNumericTable(svy_test::testdataPath("curves/cubic_parabola_exact_arclength.csv"));
   ASSERT_EQ(rows.size(), 55u);
   std::map<std::pair<double, double>, int> cases;
   for (const auto& row : rows) {
@@ -135,8 +134,8 @@ TEST(CubicTable, MatchesExactArcLengthParabola) {
     auto tol = [&](double value) { return seriesTol + 20.0 * coeffErr * std::fabs(value) + 1e-13; };
     double n = 0.0, e = 0.0;
     ASSERT_TRUE(law.getPosAtLength(s, n, e));
-    const std::string where = "L " + std::to_string(row[kL]) + " R " + std::to_string(row[kR]) +
-                              " s " + std::to_string(s);
+    const std::string where =
+        "L " + std::to_string(row[kL]) + " R " + std::to_string(row[kR]) + " s " + std::to_string(s);
     EXPECT_NEAR(n, row[kX], tol(row[kX])) << where;
     EXPECT_NEAR(e, row[kY], tol(row[kY])) << where;
     EXPECT_NEAR(law.GetAzimuth(s) * svy_math::units::kDegToRad, row[kTangent], tol(row[kTangent])) << where;
@@ -175,9 +174,8 @@ TEST_P(CubicShape, FollowsCubicAndEndsAtRadius) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Cases, CubicShape,
-                         ::testing::Values(CubicCase{100.0, 300.0}, CubicCase{60.0, 250.0},
-                                           CubicCase{50.0, 5000.0}, CubicCase{100.0, 145.0},
-                                           CubicCase{100.0, -400.0}));
+                         ::testing::Values(CubicCase{100.0, 300.0}, CubicCase{60.0, 250.0}, CubicCase{50.0, 5000.0},
+                                           CubicCase{100.0, 145.0}, CubicCase{100.0, -400.0}));
 
 TEST(CubicLimit, RadiusBelowLimitCannotBeSet) {
   CCubicSpiralTStoSC law;
@@ -208,7 +206,6 @@ TEST(CubicQuirk, LengthAtAzimuthUsesHalfTangent) {
   EXPECT_EQ(law.getLengthAtAzimuth(CMathAngle(-2.0)), 0.0);
   EXPECT_EQ(law.getLengthAtAzimuth(CMathAngle(0.0)), 0.0);
 }
-
 
 // Both laws: the side comes from the flag, not from the sign of the radius, and the left spiral mirrors the
 // right; two radii (in either order) define the full spiral to the sharper one, whose part from the flatter
