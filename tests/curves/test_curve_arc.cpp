@@ -93,6 +93,25 @@ INSTANTIATE_TEST_SUITE_P(Table, ArcStepTest,
                                            StepCase{50.0, 20.0, 3.0, 0.0, 17.0},       // no deviation: the rest
                                            StepCase{1000.0, 500.0, 500.0005, 0.01, 0.0}));
 
+// Walking the element by deviation steps reaches its end, each chord within the deviation of the arc.
+TEST(ArcElement, DeviationStepsWalkToTheEndWithinTheDeviation) {
+  const CCurveArc arc = makeArc(300.0, 400.0, 200.0, 180.0, 250.0, false);
+  double s = 0.0;
+  C2dPos previous = arc.getStartPos();
+  for (int steps = 0; s < arc.getTotalLength() && steps < 1000; ++steps) {
+    C2dPos next;
+    const double reached = arc.getNextPosForDeviation(s, 0.02, next);
+    ASSERT_GT(reached, s);
+    // Sagitta of the chord: distance from its midpoint to the arc point halfway along.
+    const C2dPos mid(0.5 * (previous.north() + next.north()), 0.5 * (previous.east() + next.east()));
+    EXPECT_LE(curve_test::distance(mid, curve_test::posAt(arc, 0.5 * (s + reached))), 0.02 + 1e-9);
+    s = reached;
+    previous = next;
+  }
+  EXPECT_NEAR(s, 180.0, 1e-12);
+  EXPECT_EQ(previous, arc.getEndPos());
+}
+
 // Closed-form oracle of the placed arc: centre on the right for a right turn, points at R from it.
 TEST(ArcElement, PositionsLieOnTheCircleAboutTheStatedCentre) {
   for (const bool right : {true, false}) {

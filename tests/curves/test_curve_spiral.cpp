@@ -159,6 +159,12 @@ TEST_P(SpiralData, PositionThenLengthAndOffsetGivesThemBack) {
       ASSERT_TRUE(spiral.getLengthAndOffset(pos, length, back)) << "s=" << s << " o=" << offset;
       EXPECT_NEAR(length, s, 1e-8) << "s=" << s << " o=" << offset;
       EXPECT_NEAR(back, offset, 1e-8) << "s=" << s << " o=" << offset;
+      // The projection finds the same foot, with the distance signed by the side (a point on an end's
+      // normal projects onto that end).
+      double dist = 0.0, len = -1.0;
+      ASSERT_TRUE(spiral.getShortestDistAndCurveLen(pos.north(), pos.east(), dist, len));
+      EXPECT_NEAR(len, s, 1e-6) << "s=" << s << " o=" << offset;
+      EXPECT_NEAR(dist, offset, 1e-9) << "s=" << s << " o=" << offset;
     }
   }
 }

@@ -76,8 +76,9 @@ TEST(CurveRange, SnapsWithinAMillimetreAndLogsBeyond) {
     n = 7.0;
     EXPECT_FALSE(c.pos(c.total + 0.0011, n, e));
     EXPECT_FALSE(c.pos(-0.0011, n, e));
+    EXPECT_FALSE(c.pos(kNaN, n, e));
     EXPECT_EQ(n, 7.0);
-    ASSERT_EQ(capture.count(), 2u);
+    ASSERT_EQ(capture.count(), 3u);
     for (const auto& entry : capture.entries()) EXPECT_EQ(entry.file, "mathCurves");
   }
   // A chord step from beyond the end is zero, logged.
