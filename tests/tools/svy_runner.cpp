@@ -31,26 +31,31 @@ std::string readWhole(const std::string& path) {
   return text.str();
 }
 
-// Temporary files of this test program, removed at exit.
+// A new file in the temporary directory holding the text.
+std::string createTempFile(const std::string& text, const std::string& suffix) {
+  const char* dir = std::getenv("TMPDIR");
+  std::string pattern = std::string(dir && *dir ? dir : "/tmp") + "/svy_test_XXXXXX" + suffix;
+  const int fd = mkstemps(pattern.data(), static_cast<int>(suffix.size()));
+  if (fd < 0) throw std::runtime_error("cannot create a temporary file");
+  std::size_t written = 0;
+  while (written < text.size()) {
+    const ssize_t n = ::write(fd, text.data() + written, text.size() - written);
+    if (n <= 0) break;
+    written += static_cast<std::size_t>(n);
+  }
+  ::close(fd);
+  return pattern;
+}
+
+// Files handed out by writeTempFile(), removed when the test program exits.
 class TempFiles {
  public:
   ~TempFiles() {
     for (const std::string& path : paths_) std::remove(path.c_str());
   }
   std::string create(const std::string& text, const std::string& suffix) {
-    const char* dir = std::getenv("TMPDIR");
-    std::string pattern = std::string(dir && *dir ? dir : "/tmp") + "/svy_test_XXXXXX" + suffix;
-    const int fd = mkstemps(pattern.data(), static_cast<int>(suffix.size()));
-    if (fd < 0) throw std::runtime_error("cannot create a temporary file");
-    std::size_t written = 0;
-    while (written < text.size()) {
-      const ssize_t n = ::write(fd, text.data() + written, text.size() - written);
-      if (n <= 0) break;
-      written += static_cast<std::size_t>(n);
-    }
-    ::close(fd);
-    paths_.push_back(pattern);
-    return pattern;
+    paths_.push_back(createTempFile(text, suffix));
+    return paths_.back();
   }
 
  private:
@@ -84,9 +89,9 @@ std::vector<std::string> splitCsvLine(const std::string& line) {
 
 SvyResult runSvy(const std::vector<std::string>& args, const std::string& stdinText) {
   // The standard streams go through files: no pipe can fill up and block either side.
-  const std::string inPath = writeTempFile(stdinText, ".in");
-  const std::string outPath = writeTempFile("", ".out");
-  const std::string errPath = writeTempFile("", ".err");
+  const std::string inPath = createTempFile(stdinText, ".in");
+  const std::string outPath = createTempFile("", ".out");
+  const std::string errPath = createTempFile("", ".err");
 
   std::vector<std::string> argvText;
   argvText.emplace_back(SVY_TOOL_PATH);
@@ -97,7 +102,10 @@ SvyResult runSvy(const std::vector<std::string>& args, const std::string& stdinT
 
   SvyResult result;
   const pid_t pid = fork();
-  if (pid < 0) return result;
+  if (pid < 0) {
+    for (const std::string* path : {&inPath, &outPath, &errPath}) std::remove(path->c_str());
+    return result;
+  }
   if (pid == 0) {
     const int in = ::open(inPath.c_str(), O_RDONLY);
     const int out = ::open(outPath.c_str(), O_WRONLY | O_TRUNC);
@@ -121,6 +129,7 @@ SvyResult runSvy(const std::vector<std::string>& args, const std::string& stdinT
   }
   result.out = readWhole(outPath);
   result.err = readWhole(errPath);
+  for (const std::string* path : {&inPath, &outPath, &errPath}) std::remove(path->c_str());
   return result;
 }
 
