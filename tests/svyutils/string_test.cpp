@@ -133,9 +133,9 @@ TEST(SvyStringBuffer, WritesThroughAndSetsTheLength) {
 // printf conversions with wide strings, positional arguments, growth for long output; a narrow byte beyond
 // ASCII has no meaning in the C locale: the text is empty, quickly.
 TEST(SvyStringFormat, PrintfConversionsPositionalArgumentsAndLongOutput) {
-  const auto format = [](const wchar_t* spec, auto... args) {
+  const auto format = [](const wchar_t* pattern, auto... args) {
     CSvyString text(L"old");
-    text.Format(spec, args...);
+    text.Format(pattern, args...);
     return text.str();
   };
   const std::wstring longText(5000, L'z');
