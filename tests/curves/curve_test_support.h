@@ -81,6 +81,21 @@ inline double sampledDistance(const CGenericSegment& segment, const C2dPos& p, i
   return best;
 }
 
+// The boundary box holds a dense sampling of the segment and is within tight of it on every side.
+inline void expectBoxHoldsSamples(const CGenericSegment& segment, int samples, double tight) {
+  const C2dMinMax box = segment.getBoundary();
+  C2dMinMax sampled;
+  for (int i = 0; i <= samples; ++i) sampled.include(posAt(segment, segment.getTotalLength() * i / samples));
+  EXPECT_LE(box.minNorth, sampled.minNorth + 1e-9);
+  EXPECT_LE(box.minEast, sampled.minEast + 1e-9);
+  EXPECT_GE(box.maxNorth, sampled.maxNorth - 1e-9);
+  EXPECT_GE(box.maxEast, sampled.maxEast - 1e-9);
+  EXPECT_NEAR(box.minNorth, sampled.minNorth, tight);
+  EXPECT_NEAR(box.minEast, sampled.minEast, tight);
+  EXPECT_NEAR(box.maxNorth, sampled.maxNorth, tight);
+  EXPECT_NEAR(box.maxEast, sampled.maxEast, tight);
+}
+
 // Rows of numbers of a CSV file after its header lines; any blank, comma, tab or CR separates fields.
 inline std::vector<std::vector<double>> readNumericTable(const std::string& path, int headerLines = 1) {
   std::vector<std::vector<double>> rows;
@@ -103,11 +118,8 @@ inline std::vector<std::vector<double>> readNumericTable(const std::string& path
 
 inline double simpsonStep(const std::function<double(double)>& f, double a, double b, double fa, double fm, double fb,
                           double whole, double tol, int depth) {
-  const double m = 0.5 * (a + b);
-  const double flm = f(0.5 * (a + m));
-  const double frm = f(0.5 * (m + b));
-  const double left = (m - a) / 6.0 * (fa + 4.0 * flm + fm);
-  const double right = (b - m) / 6.0 * (fm + 4.0 * frm + fb);
+  const double m = 0.5 * (a + b), flm = f(0.5 * (a + m)), frm = f(0.5 * (m + b));
+  const double left = (m - a) / 6.0 * (fa + 4.0 * flm + fm), right = (b - m) / 6.0 * (fm + 4.0 * frm + fb);
   const double delta = left + right - whole;
   if (depth <= 0 || std::fabs(delta) <= 15.0 * tol) return left + right + delta / 15.0;
   return simpsonStep(f, a, m, fa, flm, fm, left, 0.5 * tol, depth - 1) +
@@ -120,11 +132,7 @@ inline double integrate(const std::function<double(double)>& f, double a, double
   double sum = 0.0;
   const double h = (b - a) / pieces;
   for (int i = 0; i < pieces; ++i) {
-    const double lo = a + i * h;
-    const double hi = lo + h;
-    const double flo = f(lo);
-    const double fhi = f(hi);
-    const double fm = f(0.5 * (lo + hi));
+    const double lo = a + i * h, hi = lo + h, flo = f(lo), fhi = f(hi), fm = f(0.5 * (lo + hi));
     sum += simpsonStep(f, lo, hi, flo, fm, fhi, h / 6.0 * (flo + 4.0 * fm + fhi), tol / pieces, 40);
   }
   return sum;
