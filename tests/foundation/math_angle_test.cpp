@@ -27,47 +27,42 @@ CMathAngle unset() {
   return a;
 }
 
-// Degrees are stored as radians in the closed range [-pi, pi]; non-finite input marks the angle NaN and huge
-// input (also from products) still ends in range.
+// Stored as radians in the closed range [-pi, pi]; non-finite input marks the angle NaN and huge input
+// (also from products and sums) still ends in range.
 TEST(AngleStore, ReducesToTheClosedRangeAndNeverHangs) {
   const double cases[][2] = {{180, kPi}, {-180, -kPi}, {540, kPi}, {-540, -kPi}, {270, -kPi / 2}, {720, 0}};
   for (const auto& c : cases) EXPECT_NEAR(CMathAngle(c[0]).getRad(), c[1], 1e-12) << c[0];
-  EXPECT_TRUE(radians(kInf).isNan());
-  EXPECT_TRUE(radians(-kInf).isNan());
-  EXPECT_TRUE(CMathAngle(kNaN).isNan());
+  EXPECT_TRUE(radians(kInf).isNan() && radians(-kInf).isNan() && CMathAngle(kNaN).isNan());
   EXPECT_EQ(radians(kNaN).getRad(), 0.0);
-  for (double x : {1e300, -1e300, 1e20}) EXPECT_LE(std::fabs(radians(x).getRad()), kPi) << x;
   CMathAngle a(30.0);
-  a *= 1e300;
-  EXPECT_TRUE(a.isok());
-  a *= -1e300;
-  EXPECT_TRUE(a.isok());
-  EXPECT_LE(std::fabs(a.getRad()), kPi);
+  for (double x : {1e300, -1e300}) {
+    EXPECT_LE(std::fabs(radians(x).getRad()), kPi) << x;
+    a *= x;
+    EXPECT_TRUE(a.isok() && std::fabs(a.getRad()) <= kPi);
+  }
   a *= kInf;
   EXPECT_TRUE(a.isNan());
+  for (double x : {-170.0, 170.0})
+    for (double y : {-100.0, 135.0}) EXPECT_TRUE((CMathAngle(x) + CMathAngle(y)).isEqual(CMathAngle(x + y), 1e-12));
 }
 
+// operator== compares the stored radians (no wrap at pi); isEqual wraps and is strict on both sides.
 TEST(AngleEquality, OperatorEqualsHasNoWrapButIsEqualHas) {
-  const CMathAngle plus = radians(kPi);
-  const CMathAngle minus = radians(-kPi);
-  EXPECT_FALSE(plus == minus);
-  EXPECT_TRUE(plus != minus);
-  EXPECT_TRUE(plus.isEqual(minus, 1e-9));
+  EXPECT_TRUE(radians(kPi) != radians(-kPi));
+  EXPECT_TRUE(radians(kPi).isEqual(radians(-kPi), 1e-9));
   EXPECT_TRUE(radians(1e-13).isEqual(radians(2 * kPi - 1e-13), 1e-9));
   EXPECT_TRUE(radians(0.5) == radians(0.5 + 1e-13));
-  const double step = std::ldexp(1.0, -20);  // exact differences: the test is strict on both sides
+  const double step = std::ldexp(1.0, -20);  // exact differences
   EXPECT_FALSE(radians(0.5).isEqual(radians(0.5 + step), step));
   EXPECT_FALSE(radians(0.5 + step).isEqual(radians(0.5), step));
   EXPECT_TRUE(radians(0.5).isEqual(radians(0.5 + step), 2 * step));
-  EXPECT_TRUE(radians(-1) < radians(0.5));
-  EXPECT_TRUE(unset() <= radians(0));
-  EXPECT_TRUE(unset() >= radians(0));
+  EXPECT_TRUE(unset() <= radians(0) && unset() >= radians(0));
 }
 
 // Each setter in turn (a braced list is evaluated left to right): azimuths clockwise from north, the angle at
 // a vertex clockwise from the first ray, a bulge four times its arc tangent reduced. A failing setter
 // leaves the previous value.
-TEST(AngleSetters, TangentAzimuthVertexAndBulgeForms) {
+TEST(AngleSetters, TangentAzimuthVertexBulgeAndDmsForms) {
   CMathAngle a(10.0);
   const C2dPos o(0, 0);
   struct {
@@ -78,15 +73,12 @@ TEST(AngleSetters, TangentAzimuthVertexAndBulgeForms) {
   } const results[] = {{a.setTg(0, 0), a.getRad(), true, 0},
                        {a.setTg(kInf, 1), a.getRad(), true, kPi / 2},
                        {a.setTg(kNaN, 1), a.getRad(), false, kPi / 2},
-                       {a.setTg(1, kNaN), a.getRad(), false, kPi / 2},
                        {a.setAz(o, C2dPos(-1, 0)), a.getRad(), true, kPi},
                        {a.setAz(C2dPos(-1, -1)), a.getRad(), true, -0.75 * kPi},
-                       {a.setAz(3.0, -3.0), a.getRad(), true, -kPi / 4},
                        {a.setAz(10, 10, 10, 20), a.getRad(), true, kPi / 2},
                        {a.setAngle(C2dPos(0, 1), o, C2dPos(1, 0)), a.getRad(), true, -kPi / 2},
                        {a.setAngle(o, o, C2dPos(1, 0)), a.getRad(), false, -kPi / 2},
                        {a.setAngle(C2dPos(1, 0), o, C2dPos(kNaN, 0)), a.getRad(), false, -kPi / 2},
-                       {a.setAngle(C2dPos(1, 0), o, C2dPos(0, 1)), a.getRad(), true, kPi / 2},
                        {a.setBulge(1), a.getRad(), true, kPi},
                        {a.setBulge(-0.5), a.getRad(), true, -4 * std::atan(0.5)},
                        {a.setBulge(2), a.getRad(), true, 4 * std::atan(2.0) - 2 * kPi},
@@ -95,63 +87,38 @@ TEST(AngleSetters, TangentAzimuthVertexAndBulgeForms) {
     EXPECT_EQ(r.ok, r.expectedOk) << (&r - results);
     EXPECT_NEAR(r.rad, r.expected, 1e-15) << (&r - results);
   }
-  // DMS takes the sign from the degrees; minus zero degrees is positive.
-  a.setDMS(-12, 30, 36);
+  a.setDMS(-12, 30, 36);  // the sign comes from the degrees; minus zero degrees is positive
   EXPECT_NEAR(a.getDeg(), -12.51, 1e-12);
   a.setDMS(-0.0, 30, 0);
   EXPECT_NEAR(a.getDeg(), 0.5, 1e-12);
-}
-
-TEST(AngleSetters, ChordAndRadiusIsTwiceTheChordToRadiusAngle) {
-  for (double r : {1.0, 10.0, 250.0}) {
-    for (double c : {0.1 * r, r, 1.9 * r}) {
-      CMathAngle a;
-      a.setChordAndR(c, r);
-      const double central = 2 * std::asin(c / (2 * r));
-      EXPECT_NEAR(a.getRad(), kPi - central, 1e-12) << r << " " << c;
-    }
-  }
-  CMathAngle a;
+  a.setChordAndR(10, 250);  // the chord-to-tangent angle's supplement
+  EXPECT_NEAR(a.getRad(), kPi - 2 * std::asin(10.0 / 500), 1e-12);
   a.setChordAndR(3, 1);
   EXPECT_TRUE(a.isNan());
 }
 
-// A right angle has a zero tangent (and zero a zero cotangent); an angle that reduces to exactly 2 pi
-// keeps that upper end and lies in no quadrant.
-TEST(AngleQueries, TangentsQuadrantsAndTheUpperEnd) {
+// A right angle has a zero tangent (and zero a zero cotangent); an angle that reduces to exactly 2 pi keeps
+// that upper end and lies in no quadrant; DMS loses the sign below one degree.
+TEST(AngleQueries, TangentsQuadrantsUpperEndAndDms) {
   EXPECT_EQ(radians(-kPi / 2).getTg(), 0.0);
   EXPECT_EQ(radians(0).getCtg(), 0.0);
-  EXPECT_NEAR(CMathAngle(30.0).getCtg(), 1 / std::tan(kPi / 6), 1e-14);
   const double quadrants[][3] = {{45.0, 1, 1}, {135.0, 0, 1}, {-135.0, 0, 0}, {-45.0, 1, 0}};
   for (const auto& q : quadrants) {
     const TQuadrant got = CMathAngle(q[0]).getQuadrant();
     EXPECT_EQ(got.northward, q[1] != 0) << q[0];
     EXPECT_EQ(got.eastward, q[2] != 0) << q[0];
   }
-  // -1e-17 + 2pi rounds to exactly 2pi: quadrant "5", neither northward nor eastward.
-  const TQuadrant q = radians(-1e-17).getQuadrant();
+  const TQuadrant q = radians(-1e-17).getQuadrant();  // -1e-17 + 2 pi rounds to exactly 2 pi
   EXPECT_FALSE(q.northward || q.eastward);
   EXPECT_EQ(radians(-1e-17).get0To2PI(), svy_math::units::kTwoPi);
-  EXPECT_NEAR(radians(-kPi / 2).get0To360(), 270, 1e-12);
-  EXPECT_EQ(radians(0).get0To360(), 0);
-}
-
-TEST(AngleQueries, DmsLosesTheSignBelowOneDegree) {
   int d = 0, m = 0;
   double s = 0;
   CMathAngle(-0.5).getDMS(d, m, s);
-  EXPECT_EQ(d, 0);
-  EXPECT_EQ(m, 30);
-  EXPECT_NEAR(s, 0, 1e-9);
-  CMathAngle(-12.51).getDMS(d, m, s);
-  EXPECT_EQ(d, -12);
-  EXPECT_EQ(m, 30);
-  EXPECT_NEAR(s, 36, 1e-9);
+  EXPECT_EQ(d * 100 + m, 30);
   // Whole seconds survive the radian round trip without a 60 in any field.
   for (int sec = 0; sec < 360 * 3600; sec += 997) {
     CMathAngle(sec / 3600.0).getDMS(d, m, s);
-    EXPECT_LT(m, 60);
-    EXPECT_LT(s, 60 - 1e-12);
+    EXPECT_TRUE(m < 60 && s < 60 - 1e-12) << sec;
     EXPECT_NEAR(std::fabs(d) * 3600 + m * 60 + s, sec <= 180 * 3600 ? sec : 360 * 3600 - sec, 1e-6) << sec;
   }
 }
@@ -160,8 +127,7 @@ TEST(AngleGeometry, DirectionsPositionsAndRotationsFollowTheNorthEastConvention)
   const CMathAngle east(90.0);
   double n = 0, e = 0;
   east.getPosAlong(10, 100, 200, n, e);
-  EXPECT_NEAR(n, 100, 1e-12);
-  EXPECT_NEAR(e, 210, 1e-12);
+  EXPECT_EQ(C2dPos(n, e), C2dPos(100, 210));
   east.getPosAcross(5, 100, 200, n, e);  // right of east-bound travel is south
   EXPECT_NEAR(n, 95, 1e-12);
   EXPECT_NEAR(e, 200, 1e-12);
@@ -170,23 +136,18 @@ TEST(AngleGeometry, DirectionsPositionsAndRotationsFollowTheNorthEastConvention)
   east.getRotated(n, e);  // clockwise on the map: north turns to east
   EXPECT_NEAR(n, 0, 1e-15);
   EXPECT_NEAR(e, 1, 1e-15);
-  const CMathAngle a(37.0);
-  for (const C2dPos& p : {C2dPos(3, -4), C2dPos(-1e5, 2e5)}) {
-    double rn = p.north(), re = p.east();
-    a.getRotated(rn, re);
-    EXPECT_NEAR(std::hypot(rn, re), p.Module(), 1e-9);
-    a.getRotatedBack(rn, re);
-    EXPECT_NEAR(rn, p.north(), 1e-9);
-    EXPECT_NEAR(re, p.east(), 1e-9);
-  }
+  const C2dPos p(-1e5, 2e5);
+  double rn = p.north(), re = p.east();
+  CMathAngle(37.0).getRotated(rn, re);
+  CMathAngle(37.0).getRotatedBack(rn, re);
+  EXPECT_NEAR(rn, p.north(), 1e-9);
+  EXPECT_NEAR(re, p.east(), 1e-9);
   C2dPos r;
   CMathAngle(180.0).getRotatedPoint(C2dPos(10, 10), C2dPos(11, 10), r);
-  EXPECT_NEAR(r.north(), 9, 1e-12);
-  EXPECT_NEAR(r.east(), 10, 1e-12);
-  EXPECT_TRUE(CMathAngle(30.0).isSameAsAzimuth(C2dPos(0, 0), C2dPos(std::cos(kPi / 6), std::sin(kPi / 6))));
-  EXPECT_FALSE(CMathAngle(31.0).isSameAsAzimuth(C2dPos(0, 0), C2dPos(std::cos(kPi / 6), std::sin(kPi / 6))));
-  EXPECT_TRUE(CMathAngle(89.0).isSharp());
-  EXPECT_FALSE(CMathAngle(-90.0).isSharp());
+  EXPECT_NEAR((r - C2dPos(9, 10)).Module(), 0, 1e-12);
+  const C2dPos at30(std::cos(kPi / 6), std::sin(kPi / 6));
+  EXPECT_TRUE(CMathAngle(30.0).isSameAsAzimuth(C2dPos(0, 0), at30));
+  EXPECT_FALSE(CMathAngle(31.0).isSameAsAzimuth(C2dPos(0, 0), at30));
 }
 
 // Division by (nearly) zero gives 0 from the operator but NaN from the compound form; an unset left operand
@@ -199,55 +160,29 @@ TEST(AngleArithmetic, DivisionByZeroAndUnsetOperands) {
   CMathAngle b(30.0);
   b /= 0.0;
   EXPECT_TRUE(b.isNan());
-  EXPECT_NEAR((a + unset()).getDeg(), 30, 1e-12);
   EXPECT_NEAR((a - unset()).getDeg(), 30, 1e-12);
   const CMathAngle z = unset() + a;
-  EXPECT_TRUE(z.isok());
-  EXPECT_EQ(z.getRad(), 0);
-  EXPECT_TRUE((unset() * 3.0).isok());
+  EXPECT_TRUE(z.isok() && z.getRad() == 0);
   CMathAngle u = unset();
   u += a;
   EXPECT_TRUE(u.isNan());
-  u *= 2;
-  EXPECT_TRUE(u.isNan());
-}
-
-TEST(AngleArithmetic, SumsWrapIntoTheClosedRange) {
-  for (double x : {-170.0, 0.0, 170.0}) {
-    for (double y : {-100.0, 135.0}) {
-      const CMathAngle s = CMathAngle(x) + CMathAngle(y);
-      EXPECT_TRUE(s.isEqual(CMathAngle(x + y), 1e-12)) << x << " " << y;
-      EXPECT_GE(s.getRad(), -kPi);
-      EXPECT_LE(s.getRad(), kPi);
-      CMathAngle d(x);
-      d -= CMathAngle(y);
-      EXPECT_TRUE(d.isEqual(CMathAngle(x - y), 1e-12));
-    }
-  }
-  CMathAngle m(100.0);
-  m *= 2;
-  EXPECT_NEAR(m.getDeg(), -160, 1e-12);
 }
 
 TEST(AngleCaches, ReflectionsKeepCachesConsistentWithTheValue) {
+  using Reflect = void (CMathAngle::*)();
   for (double deg : {-170.0, -90.0, 0.0, 135.0, 180.0}) {
-    using Reflect = void (CMathAngle::*)();
     for (Reflect reflect : {static_cast<Reflect>(&CMathAngle::setComplimentary), &CMathAngle::set90MinusThis,
                             &CMathAngle::setSupplementary, &CMathAngle::set180MinusThis, &CMathAngle::changeSign}) {
-      CMathAngle warm(deg);
+      CMathAngle warm(deg), cold(deg), none = unset();
       warm.getSin();
       warm.getCos();
-      CMathAngle cold(deg);
       (warm.*reflect)();
       (cold.*reflect)();
-      EXPECT_GE(warm.getRad(), -kPi);
-      EXPECT_LE(warm.getRad(), kPi);
+      (none.*reflect)();
+      EXPECT_LE(std::fabs(warm.getRad()), kPi);
       EXPECT_NEAR(warm.getSin(), std::sin(warm.getRad()), 1e-15) << deg;
       EXPECT_NEAR(warm.getCos(), std::cos(warm.getRad()), 1e-15) << deg;
-      EXPECT_NEAR(cold.getSin(), std::sin(cold.getRad()), 1e-15) << deg;
       EXPECT_DOUBLE_EQ(warm.getRad(), cold.getRad());
-      CMathAngle none = unset();
-      (none.*reflect)();
       EXPECT_TRUE(none.isNan());
     }
   }
@@ -259,19 +194,15 @@ TEST(AngleCaches, ReflectionsKeepCachesConsistentWithTheValue) {
 }
 
 TEST(TAngleTwin, ConstructsFromRadiansAndSharesTheRules) {
-  const svy_math::TAngle t(kPi / 2);
-  EXPECT_NEAR(CMathAngle(90.0).getRad(), t.getRad(), 1e-15);
+  EXPECT_NEAR(CMathAngle(90.0).getRad(), svy_math::TAngle(kPi / 2).getRad(), 1e-15);
   EXPECT_DOUBLE_EQ(svy_math::TAngle(-kPi).getNegPIToPI(), kPi);
   EXPECT_NEAR(svy_math::TAngle(-kPi / 2).get0To2PI(), 1.5 * kPi, 1e-15);
-  EXPECT_DOUBLE_EQ(svy_math::absoluteAngle(svy_math::TAngle(-1.0)).getDouble(), 1.0);
-  const svy_math::TAngle sum = t + svy_math::TAngle(kPi);
-  EXPECT_NEAR(sum.getDouble(), -kPi / 2, 1e-15);
+  EXPECT_NEAR((svy_math::TAngle(kPi / 2) + svy_math::TAngle(kPi)).getDouble(), -kPi / 2, 1e-15);
   svy_math::TAngle q(1.0);
   EXPECT_EQ((q / 0.0).getDouble(), 0);
   q /= 0.0;
   EXPECT_TRUE(q.isNan());
   EXPECT_TRUE(svy_math::TAngle(kPi) != svy_math::TAngle(-kPi));
-  EXPECT_TRUE(svy_math::TAngle(0.1) < svy_math::TAngle(0.2));
 }
 
 }  // namespace

@@ -1,7 +1,5 @@
 #include <gtest/gtest.h>
 
-#include <cstring>
-
 #include "svymath/foundation/rtti.h"
 
 // A small hierarchy shaped like the model classes: a public interface and an implementation joined by
@@ -31,16 +29,12 @@ SVY_RTTI_DEFINE(CUnrelated, CRttiBase)
 
 using namespace rtti_test;
 
+// The id is the address of the name literal (an equal string elsewhere is not the id).
 TEST(RunTimeTypeIdentity, IdIsTheAddressOfTheNameLiteral) {
   EXPECT_EQ(CCircleShape::static_rtti_id(), static_cast<const void*>(CCircleShape::static_rtti_name()));
-  EXPECT_STREQ(CCircleShape::static_rtti_name(), "CCircleShape");
-  EXPECT_NE(CShapeBase::static_rtti_id(), CShapeImpl::static_rtti_id());
-  // Identity by address, not by text: an equal string elsewhere is not the id.
   static const char copy[] = "CCircleShape";
   EXPECT_NE(static_cast<const void*>(copy), CCircleShape::static_rtti_id());
-}
-
-TEST(RunTimeTypeIdentity, DynamicNameAndIdThroughTheRoot) {
+  EXPECT_NE(CShapeBase::static_rtti_id(), CShapeImpl::static_rtti_id());
   CCircleShape circle;
   const CRttiBase& root = circle;
   EXPECT_EQ(root.get_rtti_id(), CCircleShape::static_rtti_id());
@@ -57,14 +51,9 @@ TEST(RunTimeTypeIdentity, CastAdjustsThePointerAcrossBothBases) {
   EXPECT_EQ(impl->payload, 1.5);
   EXPECT_EQ(CUnrelated::cast(root), nullptr);
   EXPECT_EQ(CCircleShape::cast(static_cast<CRttiBase*>(nullptr)), nullptr);
-
   const CRttiBase* constRoot = root;
   EXPECT_EQ(CCircleShape::cast(constRoot), &circle);
   EXPECT_TRUE(constRoot->is_rtti_type(CRttiBase::static_rtti_id()));
-}
-
-TEST(RunTimeTypeIdentity, ABaseIsNotItsDerivedClass) {
-  CShapeImpl impl;
-  EXPECT_EQ(CCircleShape::cast(&impl), nullptr);
-  EXPECT_EQ(CShapeImpl::cast(&impl), &impl);
+  CShapeImpl alone;  // a base is not its derived class
+  EXPECT_EQ(CCircleShape::cast(&alone), nullptr);
 }
