@@ -12,85 +12,61 @@
 
 namespace {
 
-using curve_test::azimuthDeg;
-using svy_math::TAngle;
 using svy_math::TLine;
 
-struct ExtentCase {
-  EIntersectionType type;
-  double along;
-  bool onLine;
-};
-
-class LineExtentTest : public ::testing::TestWithParam<ExtentCase> {};
-
-TEST_P(LineExtentTest, AcceptsLengthsByIntersectionType) {
-  const ExtentCase& c = GetParam();
-  const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(0.0, 100.0), c.type);
-  EXPECT_EQ(line.checkDistanceAlongIsOnLine(c.along), c.onLine) << "along " << c.along;
-  // The same rule decides whether a point beside the line gets a length.
-  double length = -7.0, offset = -7.0;
-  EXPECT_EQ(line.getLengthAndOffset(C2dPos(3.0, c.along), length, offset), c.onLine);
-  if (c.onLine) {
+// Lengths along an eastward line are accepted by intersection type; the same rule decides whether a point
+// 3 m north of the line (its left) gets a length and offset.
+TEST(GenericLine, ExtentByIntersectionType) {
+  const struct {
+    EIntersectionType type;
+    double along;
+    bool onLine;
+  } cases[] = {{eIntersectOnSegment, -0.0005, false},    {eIntersectOnSegmentTol, -0.0005, true},
+               {eIntersectUnbounded, -0.0005, true},     {eIntersectOnSegment, 0.0, true},
+               {eIntersectOnSegment, 100.0, true},       {eIntersectOnSegmentTol, 100.0009, true},
+               {eIntersectOnSegmentTol, 100.0011, false}, {eIntersectOnSegmentTol, -0.002, false},
+               {eIntersectUnbounded, -1e6, true},        {eIntersectUnbounded, 1e9, true}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.along);
+    const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(0.0, 100.0), c.type);
+    EXPECT_EQ(line.checkDistanceAlongIsOnLine(c.along), c.onLine);
+    double length = -7.0, offset = -7.0;
+    EXPECT_EQ(line.getLengthAndOffset(C2dPos(3.0, c.along), length, offset), c.onLine);
     // The direction east is pi/2 rounded to a double: its cosine leaves 6e-17 of the along distance across.
     const double tolerance = 1e-12 + 1e-16 * std::fabs(c.along);
-    EXPECT_NEAR(length, c.along, tolerance);
-    EXPECT_NEAR(offset, -3.0, tolerance);  // north of an eastward line is its left
-  } else {
-    EXPECT_EQ(length, -7.0);
-    EXPECT_EQ(offset, -7.0);
+    EXPECT_NEAR(length, c.onLine ? c.along : -7.0, tolerance);
+    EXPECT_NEAR(offset, c.onLine ? -3.0 : -7.0, tolerance);
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Table, LineExtentTest,
-    ::testing::Values(ExtentCase{eIntersectOnSegment, -0.0005, false},
-                      ExtentCase{eIntersectOnSegmentTol, -0.0005, true}, ExtentCase{eIntersectUnbounded, -0.0005, true},
-                      ExtentCase{eIntersectOnSegment, 0.0, true}, ExtentCase{eIntersectOnSegment, 100.0, true},
-                      ExtentCase{eIntersectOnSegmentTol, 100.0009, true},
-                      ExtentCase{eIntersectOnSegmentTol, 100.0011, false},
-                      ExtentCase{eIntersectOnSegmentTol, -0.002, false}, ExtentCase{eIntersectUnbounded, -1e6, true},
-                      ExtentCase{eIntersectUnbounded, 1e9, true}, ExtentCase{eIntersectOnSegment, 50.0, true}));
-
-struct RoundTripCase {
-  double north;
-  double east;
-  double azDeg;
-  double length;
-  double offset;
-};
-
-class LineRoundTripTest : public ::testing::TestWithParam<RoundTripCase> {};
-
-TEST_P(LineRoundTripTest, PositionThenLengthAndOffsetGivesThemBack) {
-  const RoundTripCase& c = GetParam();
-  const CGenericLineImpl line(C2dPos(c.north, c.east), azimuthDeg(c.azDeg), 250.0, eIntersectOnSegment);
-  C2dPos pos;
-  ASSERT_TRUE(line.getPosAtLengthAndOffset(c.length, c.offset, pos));
-  // Independent check of the axis convention: offset to the right of azimuth a is (-sin a, cos a).
-  const double a = c.azDeg * svy_math::units::kDegToRad;
-  curve_test::expectPosNear(pos, c.north + c.length * std::cos(a) - c.offset * std::sin(a),
-                            c.east + c.length * std::sin(a) + c.offset * std::cos(a), 1e-8);
-  double length = 0.0, offset = 0.0, distance = 0.0;
-  ASSERT_TRUE(line.getLengthAndOffset(pos, length, offset));
-  EXPECT_NEAR(length, c.length, 1e-8);
-  EXPECT_NEAR(offset, c.offset, 1e-8);
-  ASSERT_TRUE(line.getShortestDistanceToPoint(pos, distance));
-  EXPECT_NEAR(distance, std::fabs(c.offset), 1e-8);
+// Offset to the right of azimuth a is (-sin a, cos a); length and offset give the position back.
+TEST(GenericLine, PositionAndLengthOffsetRoundTrip) {
+  const struct {
+    double north, east, azDeg, length, offset;
+  } cases[] = {{0.0, 0.0, 0.0, 10.0, 2.5},           {0.0, 0.0, 90.0, 0.0, -4.0},
+               {10.0, -5.0, 180.0, 250.0, 1.0},      {0.0, 0.0, -90.0, 125.0, 0.0},
+               {5000000.0, 500000.0, 37.25, 77.7, -12.3}, {-300.0, 42.0, 271.5, 200.0, 1000.0}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.azDeg);
+    const CGenericLineImpl line(C2dPos(c.north, c.east), CMathAngle(c.azDeg), 250.0, eIntersectOnSegment);
+    C2dPos pos;
+    ASSERT_TRUE(line.getPosAtLengthAndOffset(c.length, c.offset, pos));
+    const double a = c.azDeg * svy_math::units::kDegToRad;
+    curve_test::expectPosNear(pos, c.north + c.length * std::cos(a) - c.offset * std::sin(a),
+                              c.east + c.length * std::sin(a) + c.offset * std::cos(a), 1e-8);
+    double length = 0.0, offset = 0.0, distance = 0.0;
+    ASSERT_TRUE(line.getLengthAndOffset(pos, length, offset));
+    EXPECT_NEAR(length, c.length, 1e-8);
+    EXPECT_NEAR(offset, c.offset, 1e-8);
+    ASSERT_TRUE(line.getShortestDistanceToPoint(pos, distance));
+    EXPECT_NEAR(distance, std::fabs(c.offset), 1e-8);
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(Table, LineRoundTripTest,
-                         ::testing::Values(RoundTripCase{0.0, 0.0, 0.0, 10.0, 2.5},
-                                           RoundTripCase{0.0, 0.0, 90.0, 0.0, -4.0},
-                                           RoundTripCase{10.0, -5.0, 180.0, 250.0, 1.0},
-                                           RoundTripCase{0.0, 0.0, -90.0, 125.0, 0.0},
-                                           RoundTripCase{5000000.0, 500000.0, 37.25, 77.7, -12.3},
-                                           RoundTripCase{-300.0, 42.0, 271.5, 200.0, 1000.0}));
 
 // A line from a point and an azimuth is 1000 long and unbounded; tiny lengths and offsets come back as an
 // exact (positive) zero; the shortest distance is to the prolonged line, beyond the extent as well.
 TEST(GenericLine, DefaultLengthExactZeroAndProlongedDistance) {
-  const CGenericLineImpl fromAzimuth(C2dPos(100.0, 200.0), azimuthDeg(90.0));
+  const CGenericLineImpl fromAzimuth(C2dPos(100.0, 200.0), CMathAngle(90.0));
   EXPECT_EQ(fromAzimuth.getIntersectionType(), eIntersectUnbounded);
   EXPECT_NEAR(fromAzimuth.getEndEasting(), 1200.0, 1e-9);
   double length = 1.0, offset = 1.0, distance = 0.0;
@@ -107,16 +83,13 @@ TEST(GenericLine, DefaultLengthExactZeroAndProlongedDistance) {
 }
 
 TEST(SegmentData, EndPointAndLengthWithAzimuthAgree) {
-  CCurveDataSegment byEnd;
+  CCurveDataSegment byEnd, byLength;
   byEnd.setFinalNE(30.0, -40.0);
-  CCurveDataSegment byLength;
   ASSERT_TRUE(byLength.setLen(50.0));
   byLength.setAzRad(std::atan2(-40.0, 30.0));
   for (const CCurveDataSegment* data : {&byEnd, &byLength}) {
     ASSERT_TRUE(data->isok());
     EXPECT_NEAR(data->getTotalLength(), 50.0, 1e-12);
-    EXPECT_NEAR(data->getFinalNorthing(), 30.0, 1e-12);
-    EXPECT_NEAR(data->getFinalEasting(), -40.0, 1e-12);
     EXPECT_NEAR(data->GetAzimuth(17.0), std::atan2(-40.0, 30.0) * svy_math::units::kRadToDeg, 1e-12);
     double north = 0.0, east = 0.0;
     ASSERT_TRUE(data->getPosAtLength(10.0, north, east));
@@ -127,49 +100,37 @@ TEST(SegmentData, EndPointAndLengthWithAzimuthAgree) {
   EXPECT_FALSE(byLength.setLen(-1.0));
 }
 
-TEST(SegmentElement, PlacedByOriginAndAzimuth) {
+TEST(SegmentElement, PlacedByOriginAndAzimuthOrUnplaced) {
   CCurveDataSegment data;
   data.setLen(100.0);
   data.setAzDeg(10.0);  // the tangent runs 10 degrees right of the frame
   CCurveSegment segment(1000.0, 2000.0, CMathAngle(80.0), data);
-  EXPECT_TRUE(segment.isok());
   EXPECT_NEAR(segment.getAzimuthAtLength(50.0), 90.0, 1e-12);
   CMathAngle frame;
   ASSERT_TRUE(segment.getStartAzWithoutCurveTurn(frame));
   EXPECT_NEAR(frame.getDeg(), 80.0, 1e-12);
-  EXPECT_NEAR(segment.getEndNorthing(), 1000.0, 1e-9);
-  EXPECT_NEAR(segment.getEndEasting(), 2100.0, 1e-9);
-  C2dPos pos;
+  C2dPos pos(7.0, 8.0), ip;
   ASSERT_TRUE(segment.getPosAtLengthAndOffset(40.0, 5.0, pos));  // right of an eastward tangent is south
   curve_test::expectPosNear(pos, 995.0, 2040.0, 1e-9);
-  double length = 0.0, offset = 0.0, dist = 0.0, len = 0.0;
-  ASSERT_TRUE(segment.getLengthAndOffset(pos, length, offset));
-  EXPECT_NEAR(length, 40.0, 1e-9);
-  EXPECT_NEAR(offset, 5.0, 1e-9);
+  double dist = 0.0, len = 0.0;
   ASSERT_TRUE(segment.getShortestDistAndCurveLen(1003.0, 2150.0, dist, len));  // beyond the end: clamped
   EXPECT_NEAR(len, 100.0, 1e-9);
   EXPECT_NEAR(dist, -std::hypot(3.0, 50.0), 1e-9);
-  C2dPos ip;
   EXPECT_FALSE(segment.getCurveIp(ip));  // a straight has parallel end tangents
-}
-
-TEST(SegmentElement, UnplacedOrUndefinedElementAnswersNothing) {
-  CCurveSegment segment;
-  C2dPos pos(7.0, 8.0);
-  EXPECT_FALSE(segment.getPosAtLength(0.0, pos));
-  EXPECT_EQ(pos, C2dPos(7.0, 8.0));
-  segment.setStartValues(1.0, 2.0, CMathAngle(0.0));
-  EXPECT_FALSE(segment.isok());  // placed, but the data is still undefined
-  segment.setCurve(curve_test::makeSegment(0.0, 0.0, 0.0, 5.0).getCurve());
-  EXPECT_TRUE(segment.isok());
-  segment.resetOrgAz();
-  EXPECT_FALSE(segment.isok());
+  CCurveSegment unplaced;
+  EXPECT_FALSE(unplaced.getPosAtLength(0.0, pos));
+  EXPECT_EQ(pos, C2dPos(995.0, 2040.0));
+  unplaced.setStartValues(1.0, 2.0, CMathAngle(0.0));
+  EXPECT_FALSE(unplaced.isok());  // placed, but the data is still undefined
+  unplaced.setCurve(data);
+  EXPECT_TRUE(unplaced.isok());
+  unplaced.resetOrgAz();
+  EXPECT_FALSE(unplaced.isok());
 }
 
 TEST(TLine, AzimuthAndLengthFormMatchesTwoPointFormAndEmptyLineGivesNothing) {
-  const TLine fromAzimuth(C2dPos(10.0, 20.0), TAngle(0.75), 50.0);
+  const TLine fromAzimuth(C2dPos(10.0, 20.0), svy_math::TAngle(0.75), 50.0);
   const TLine fromPoints(C2dPos(10.0, 20.0), C2dPos(10.0 + 50.0 * std::cos(0.75), 20.0 + 50.0 * std::sin(0.75)));
-  ASSERT_TRUE(fromAzimuth.isok());
   EXPECT_NEAR(fromAzimuth.getTotalLength(), 50.0, 1e-12);
   EXPECT_NEAR(fromPoints.getAzimuth().getRad(), 0.75, 1e-12);
   double n1 = 0.0, e1 = 0.0, n2 = 0.0, e2 = 0.0;
@@ -177,32 +138,32 @@ TEST(TLine, AzimuthAndLengthFormMatchesTwoPointFormAndEmptyLineGivesNothing) {
   ASSERT_TRUE(fromPoints.getPosAtLengthAndOffset(20.0, -3.0, n2, e2));
   EXPECT_NEAR(n1, n2, 1e-12);
   EXPECT_NEAR(e1, e2, 1e-12);
-  const TLine empty;
-  EXPECT_FALSE(empty.isok());
-  EXPECT_FALSE(empty.getPosAtLength(1.0, n1, e1));
+  EXPECT_FALSE(TLine().isok());
+  EXPECT_FALSE(TLine().getPosAtLength(1.0, n1, e1));
   EXPECT_EQ(n1, n2);  // untouched
 }
 
 // Identity by class: cast follows the hierarchy upward and refuses sideways; a clone keeps kind,
 // placement and intersection type.
 TEST(SegmentRtti, CastFollowsTheHierarchyAndClonesKeepTheirKind) {
-  std::unique_ptr<CGenericSegment> segments[] = {
-      std::make_unique<TLine>(C2dPos(0.0, 0.0), C2dPos(1.0, 1.0)),
-      std::make_unique<CGenericLineImpl>(C2dPos(0.0, 0.0), C2dPos(1.0, 1.0)),
-      std::make_unique<CCurveSegment>(curve_test::makeSegment(0.0, 0.0, 10.0, 5.0)),
-      std::make_unique<CCurveArc>(curve_test::makeArc(0.0, 0.0, 10.0, 5.0, 50.0, true)),
-      std::make_unique<CCurveSpiral>(curve_test::makeSpiral(1.0, 2.0, 3.0, 60.0, 300.0, true, false)),
-  };
-  const char* names[] = {"TLine", "CGenericLineImpl", "CCurveSegment", "CCurveArc", "CCurveSpiral"};
-  const char kinds[] = {'L', 'L', 'L', 'A', 'S'};
-  for (int i = 0; i < 5; ++i) {
-    CGenericSegment* segment = segments[i].get();
-    SCOPED_TRACE(names[i]);
-    EXPECT_STREQ(segment->get_rtti_name(), names[i]);
+  const struct {
+    std::shared_ptr<CGenericSegment> segment;
+    const char* name;
+    char kind;
+  } cases[] = {{std::make_shared<TLine>(C2dPos(0.0, 0.0), C2dPos(1.0, 1.0)), "TLine", 'L'},
+               {std::make_shared<CGenericLineImpl>(C2dPos(0.0, 0.0), C2dPos(1.0, 1.0)), "CGenericLineImpl", 'L'},
+               {std::make_shared<CCurveSegment>(curve_test::makeSegment(0.0, 0.0, 10.0, 5.0)), "CCurveSegment", 'L'},
+               {std::make_shared<CCurveArc>(curve_test::makeArc(0.0, 0.0, 10.0, 5.0, 50.0, true)), "CCurveArc", 'A'},
+               {std::make_shared<CCurveSpiral>(curve_test::makeSpiral(1.0, 2.0, 3.0, 60.0, 300.0, true, false)),
+                "CCurveSpiral", 'S'}};
+  for (const auto& c : cases) {
+    CGenericSegment* segment = c.segment.get();
+    SCOPED_TRACE(c.name);
+    EXPECT_STREQ(segment->get_rtti_name(), c.name);
     EXPECT_EQ(CGenericSegment::cast(segment), segment);
-    EXPECT_EQ(CGenericLine::cast(segment) != nullptr, kinds[i] == 'L');
-    EXPECT_EQ(CGenericArc::cast(segment) != nullptr, kinds[i] == 'A');
-    EXPECT_EQ(CGenericSpiral::cast(static_cast<const CRttiBase*>(segment)) != nullptr, kinds[i] == 'S');
+    EXPECT_EQ(CGenericLine::cast(segment) != nullptr, c.kind == 'L');
+    EXPECT_EQ(CGenericArc::cast(segment) != nullptr, c.kind == 'A');
+    EXPECT_EQ(CGenericSpiral::cast(static_cast<const CRttiBase*>(segment)) != nullptr, c.kind == 'S');
     EXPECT_TRUE(segment->is_rtti_type(CRttiBase::static_rtti_id()));
   }
   CCurveArc arc = curve_test::makeArc(100.0, 200.0, 30.0, 40.0, 80.0, false);
@@ -214,9 +175,9 @@ TEST(SegmentRtti, CastFollowsTheHierarchyAndClonesKeepTheirKind) {
   const std::unique_ptr<CGenericSegment> spiralCopy(
       curve_test::makeSpiral(1.0, 2.0, 3.0, 60.0, 300.0, true, false).clone());
   ASSERT_NE(CCurveSpiral::cast(spiralCopy.get()), nullptr);
-  EXPECT_EQ(spiralCopy->getEndPos(), segments[4]->getEndPos());
-  EXPECT_EQ(TLine::cast(segments[1].get()), nullptr);
-  EXPECT_EQ(CCurveArc::cast(segments[3].get()), segments[3].get());
+  EXPECT_EQ(spiralCopy->getEndPos(), cases[4].segment->getEndPos());
+  EXPECT_EQ(TLine::cast(cases[1].segment.get()), nullptr);
+  EXPECT_EQ(CCurveArc::cast(cases[3].segment.get()), cases[3].segment.get());
   EXPECT_EQ(CGenericLine::cast(static_cast<CRttiBase*>(nullptr)), nullptr);
   // Identity is by address of the class's own name, not by the text of it.
   EXPECT_NE(TLine::static_rtti_id(), CGenericLineImpl::static_rtti_id());
