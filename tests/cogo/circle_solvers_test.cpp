@@ -42,14 +42,9 @@ TEST(LineCircle, FindsBothChordEndsInTravelOrder) {
     C2dPos center;
     double radius, az1, az2;  // azimuths (degrees) of the chord ends seen from the centre
     double t1, t2;            // the line points, as parameters along end1 -> end2
-  } const cases[] = {{kOrigin, 10.0, 30.0, 150.0, 0.25, 0.75},  // line points inside the circle
-                     {kOrigin, 10.0, 30.0, 150.0, 2.0, -0.5},   // travelling the other way
-                     {kOrigin, 5.0, 10.0, -10.0, 0.0, 1.0},     // constant northing
-                     {kOrigin, 5.0, 89.99, 90.01, 0.0, 1.0},    // nearly constant easting
-                     {kOrigin, 5.0, 45.0, 225.0, -1.0, 3.0},    // diameter
-                     {kGrid, 250.0, 100.0, 280.0, 1.0, -3.0},   // grid coordinates
-                     {kGrid, 1000.0, 300.0, 300.5, -2.0, 7.0},  // short chord of a large circle
-                     {kSouthGrid, 3000.0, 135.0, 315.0, 4.0, 2.0}};
+  } const cases[] = {{kOrigin, 10.0, 30.0, 150.0, 0.25, 0.75},  {kOrigin, 5.0, 10.0, -10.0, 0.0, 1.0},
+                     {kOrigin, 5.0, 89.99, 90.01, 0.0, 1.0},    {kGrid, 250.0, 100.0, 280.0, 1.0, -3.0},
+                     {kGrid, 1000.0, 300.0, 300.5, -2.0, 7.0},  {kSouthGrid, 3000.0, 135.0, 315.0, 4.0, 2.0}};
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c.radius << " " << c.az1 << " " << c.az2 << " " << c.t1);
     const C2dPos end1 = onCircle(c.center, c.radius, c.az1), end2 = onCircle(c.center, c.radius, c.az2);
@@ -71,9 +66,9 @@ TEST(LineCircle, FindsBothChordEndsInTravelOrder) {
 
 // A line tangent to the circle at a chosen point, given by two points away from it, touches once.
 TEST(LineCircle, TangentTouchesOnceAtTheTangentPoint) {
-  for (const C2dPos& center : {kOrigin, kGrid, kSouthGrid}) {
+  for (const C2dPos& center : {kOrigin, kSouthGrid}) {
     for (double radius : {1.0, 2500.0}) {
-      for (double azimuthDeg : {0.0, 143.0, 270.0, 333.3}) {
+      for (double azimuthDeg : {143.0, 270.0}) {
         SCOPED_TRACE(::testing::Message() << center.north() << " " << radius << " " << azimuthDeg);
         const C2dPos touch = onCircle(center, radius, azimuthDeg);
         const double a = azimuthDeg * kDegToRad;
@@ -98,8 +93,6 @@ TEST(LineCircle, MissesBeyondTheToleranceAndCrossesJustInside) {
                                              kGrid, radius, s1, s2);
   };
   EXPECT_EQ(solve(kGrid.north() + radius + 1e-6, -10, 10), 0);
-  EXPECT_EQ(s1, C2dPos(-1, -1));
-  EXPECT_EQ(s2, C2dPos(-2, -2));
   const double inside = kGrid.north() + radius - 1e-6;
   ASSERT_EQ(solve(inside, -10, 10), 2);
   // Half chord sqrt(2 R delta - delta^2) = 0.01414 m, westward first; delta as stored (exact difference).
@@ -110,22 +103,7 @@ TEST(LineCircle, MissesBeyondTheToleranceAndCrossesJustInside) {
   // A chord shorter than 2 sqrt(2 R 1e-8) (2.8 mm here) is within the tangency tolerance: one point.
   const double touching = kGrid.north() + radius - 0.5e-8;
   ASSERT_EQ(solve(touching, 10, -10), 1);
-  EXPECT_NEAR(s1.north(), touching, 1e-9);
-  EXPECT_NEAR(s1.east(), kGrid.east(), 1e-9);
-}
-
-TEST(LineCircle, InputThatDefinesNoLineOrCircleGivesNoSolution) {
-  C2dPos s1(-1, -1), s2(-2, -2);
-  const C2dPos a(1.0, 2.0), b(3.0, 5.0), n(kNaN, 0.0), far(1e308, 0.0);
-  struct {
-    C2dPos p, q, center;
-    double radius;
-  } const cases[] = {{a, a, kOrigin, 10.0}, {a, b, kOrigin, 0.0},  {a, b, kOrigin, -10.0},
-                     {a, b, kOrigin, kNaN}, {a, b, n, 10.0},       {n, b, kOrigin, 10.0},
-                     {far, C2dPos(1e308, 1.0), C2dPos(-1e308, 0.0), 1.0}};  // differences that overflow
-  for (const auto& c : cases) EXPECT_EQ(IntersectionCoordsOfLineAndCircle(c.p, c.q, c.center, c.radius, s1, s2), 0);
-  EXPECT_EQ(s1, C2dPos(-1, -1));
-  EXPECT_EQ(s2, C2dPos(-2, -2));
+  EXPECT_NEAR(dist(s1, C2dPos(touching, kGrid.east())), 0.0, 1e-9);
 }
 
 // Circles through two chosen points, centred on either side of (or on) their perpendicular bisector: the
@@ -134,10 +112,8 @@ TEST(TwoCircles, FindsBothPointsRightOfTheCentreLineFirst) {
   struct {
     C2dPos p, q;        // the crossings
     double off1, off2;  // signed distances of the centres from the chord middle along its right normal
-  } const cases[] = {{C2dPos(0, -3), C2dPos(0, 3), 4.0, -4.0},
-                     {C2dPos(0, -3), C2dPos(0, 3), 1.0, 9.0},   // centres on one side
+  } const cases[] = {{C2dPos(0, -3), C2dPos(0, 3), 1.0, 9.0},   // centres on one side
                      {C2dPos(0, -3), C2dPos(0, 3), 0.0, 50.0},  // chord is a diameter
-                     {C2dPos(5000010.0, 500020.0), C2dPos(4999970.0, 499990.0), -120.0, 35.0},
                      {C2dPos(5000010.0, 500020.0), C2dPos(5000010.5, 500020.25), -800.0, 600.0},
                      {kSouthGrid, C2dPos(9876000.0, 712000.0), 3000.0, -10.0}};
   for (const auto& c : cases) {
@@ -169,8 +145,7 @@ TEST(TwoCircles, TangentCirclesTouchOnceOnTheCentreLine) {
     C2dPos center1;
     double r1, r2, azimuthDeg;  // direction centre1 -> centre2
     bool internal;
-  } const cases[] = {{kOrigin, 3.0, 4.0, 123.0, false},   {kGrid, 250.0, 40.0, 211.0, false},
-                     {kGrid, 250.0, 40.0, 300.0, true},   {kGrid, 40.0, 250.0, 45.0, true},
+  } const cases[] = {{kGrid, 250.0, 40.0, 211.0, false}, {kGrid, 40.0, 250.0, 45.0, true},
                      {kSouthGrid, 1500.0, 1499.0, 95.0, true}};
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c.r1 << " " << c.r2 << " " << c.azimuthDeg);
@@ -189,18 +164,27 @@ TEST(TwoCircles, TangentCirclesTouchOnceOnTheCentreLine) {
   }
 }
 
-TEST(TwoCircles, DisjointNestedConcentricAndInvalidGiveNoSolution) {
+// Disjoint, nested, concentric or invalid circles, and input that defines no line or circle (also differences
+// that overflow), give no solution and leave the outputs alone.
+TEST(NoSolution, DisjointNestedConcentricAndInvalidInput) {
   C2dPos s1(-1, -1), s2(-2, -2);
+  const C2dPos a(1.0, 2.0), b(3.0, 5.0), n(kNaN, 0.0), far(1e308, 0.0);
+  struct {
+    C2dPos p, q, center;
+    double radius;
+  } const lines[] = {{a, a, kOrigin, 10.0}, {a, b, kOrigin, 0.0}, {a, b, kOrigin, kNaN},
+                     {a, b, n, 10.0},       {n, b, kOrigin, 10.0}, {far, C2dPos(1e308, 1.0), C2dPos(-1e308, 0.0), 1.0}};
+  for (const auto& c : lines) EXPECT_EQ(IntersectionCoordsOfLineAndCircle(c.p, c.q, c.center, c.radius, s1, s2), 0);
   const C2dPos north30(kGrid.north() + 30.0, kGrid.east()), north3(kGrid.north() + 3.0, kGrid.east());
   struct {
     C2dPos c1;
     double r1;
     C2dPos c2;
     double r2;
-  } const cases[] = {{kGrid, 10.0, north30, 10.0},  {kGrid, 50.0, north3, 10.0},      {kGrid, 50.0, kGrid, 50.0},
-                     {kGrid, 50.0, kGrid, 20.0},    {kGrid, 50.0, C2dPos(kGrid.north() + 1e-9, kGrid.east()), 50.0},
-                     {kGrid, 0.0, kOrigin, 10.0},   {kGrid, 10.0, kOrigin, -10.0},    {kGrid, kNaN, kOrigin, 10.0},
-                     {C2dPos(0.0, kNaN), 10.0, kOrigin, 10.0},
+  } const cases[] = {{kGrid, 10.0, north30, 10.0}, {kGrid, 50.0, north3, 10.0}, {kGrid, 50.0, kGrid, 20.0},
+                     {kGrid, 50.0, kGrid, 50.0},
+                     {kGrid, 50.0, C2dPos(kGrid.north() + 1e-9, kGrid.east()), 50.0},
+                     {kGrid, 10.0, kOrigin, -10.0}, {C2dPos(0.0, kNaN), 10.0, kOrigin, 10.0},
                      {C2dPos(-1e308, 0.0), 1e308, C2dPos(1e308, 0.0), 1e308}};
   for (const auto& c : cases) EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.c1, c.r1, c.c2, c.r2, s1, s2), 0);
   EXPECT_EQ(s1, C2dPos(-1, -1));
@@ -218,7 +202,6 @@ TEST(TwoCircles, NearlyConcentricCircles) {
     ASSERT_EQ(IntersectionCoordsOfTwoCircles(kOrigin, r1, center2, r2, s1, s2), 1);
     EXPECT_NEAR(dist(s1, kOrigin), r1, 1e-8);
     EXPECT_NEAR(dist(s1, center2), r2, 1e-8);
-    EXPECT_NEAR(s1.north(), 0.0, 1e-12);
     EXPECT_GT(s1.east() * (firstLarger ? 1.0 : -1.0), 0.0);
   }
   // Equal circles a little apart cross almost a diameter apart, across the centre line.
