@@ -1,9 +1,8 @@
 #pragma once
-// Helpers shared by the adjustment tests: products written out plainly (the oracle the library's products
-// are checked against) and seeded random matrices.
+// Helpers shared by the adjustment tests: seeded random matrices and products written out plainly (the
+// oracle the library's products and inverses are checked against).
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <random>
 
 #include "svymath/adjustment/matr3_3.h"
@@ -11,32 +10,61 @@
 
 namespace adj_test {
 
-inline svy_math::TMatrix randomMatrix(int rows, int cols, std::mt19937& rng) {
+using svy_math::TMatrix;
+using svy_math::TSMatrix;
+
+inline TMatrix randomMatrix(int rows, int cols, std::mt19937& rng) {
   std::uniform_real_distribution<double> value(-2.0, 2.0);
-  svy_math::TMatrix m(rows, cols);
+  TMatrix m(rows, cols);
   for (int j = 1; j <= cols; ++j)
     for (int i = 1; i <= rows; ++i) m(i, j) = value(rng);
   return m;
 }
 
+inline TMatrix full(const TSMatrix& s) {
+  TMatrix m(s.order(), s.order());
+  for (int i = 1; i <= s.order(); ++i)
+    for (int j = 1; j <= s.order(); ++j) m(i, j) = s(i, j);
+  return m;
+}
+
+inline TMatrix full(const TMatrix& m) { return m; }
+
+inline TMatrix transpose(const TMatrix& m) {
+  TMatrix t(m.cols(), m.rows());
+  for (int i = 1; i <= m.rows(); ++i)
+    for (int j = 1; j <= m.cols(); ++j) t(j, i) = m(i, j);
+  return t;
+}
+
+inline TMatrix multiply(const TMatrix& x, const TMatrix& y) {
+  TMatrix p(x.rows(), y.cols());
+  for (int i = 1; i <= x.rows(); ++i)
+    for (int j = 1; j <= y.cols(); ++j)
+      for (int k = 1; k <= x.cols(); ++k) p(i, j) += x(i, k) * y(k, j);
+  return p;
+}
+
 // A random symmetric positive-definite matrix: b^T b + n I.
-inline svy_math::TSMatrix randomPositiveDefinite(int n, std::mt19937& rng) {
-  const svy_math::TMatrix b = randomMatrix(n, n, rng);
-  svy_math::TSMatrix s(n);
+inline TSMatrix randomPositiveDefinite(int n, std::mt19937& rng) {
+  const TMatrix b = randomMatrix(n, n, rng), p = multiply(transpose(b), b);
+  TSMatrix s(n);
   for (int i = 1; i <= n; ++i)
-    for (int j = 1; j <= i; ++j) {
-      double sum = i == j ? n : 0.0;
-      for (int k = 1; k <= n; ++k) sum += b(k, i) * b(k, j);
-      s(i, j) = sum;
-    }
+    for (int j = 1; j <= i; ++j) s(i, j) = p(i, j) + (i == j ? n : 0.0);
   return s;
 }
 
-// The full product of two symmetric matrices, element (i, j).
-inline double symmetricProductElement(const svy_math::TSMatrix& a, const svy_math::TSMatrix& b, int i, int j) {
-  double sum = 0.0;
-  for (int k = 1; k <= a.order(); ++k) sum += a(i, k) * b(k, j);
-  return sum;
+inline void expectNear(const TMatrix& x, const TMatrix& y, double tolerance) {
+  ASSERT_TRUE(x.rows() == y.rows() && x.cols() == y.cols()) << x.rows() << "x" << x.cols();
+  for (int i = 1; i <= x.rows(); ++i)
+    for (int j = 1; j <= x.cols(); ++j) EXPECT_NEAR(x(i, j), y(i, j), tolerance) << "element " << i << "," << j;
+}
+
+// The product of a symmetric matrix and its claimed inverse is the identity.
+inline void expectInverseOf(const TSMatrix& original, const TSMatrix& inverse, double tolerance) {
+  TMatrix identity(original.order(), original.order());
+  for (int i = 1; i <= original.order(); ++i) identity(i, i) = 1.0;
+  expectNear(multiply(full(original), full(inverse)), identity, tolerance);
 }
 
 inline void expectIdentity(const svy_math::matr3_3& m, double tolerance) {

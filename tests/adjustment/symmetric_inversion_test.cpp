@@ -6,106 +6,89 @@
 #include "matrix_test_support.h"
 #include "svymath/adjustment/symmetric_inversion.h"
 
+using adj_test::full;
+using adj_test::multiply;
 using svy_math::TSMatrix;
 
 namespace {
 
-void expectInverseOf(const TSMatrix& original, const TSMatrix& inverse, double tolerance) {
-  for (int i = 1; i <= original.order(); ++i)
-    for (int j = 1; j <= original.order(); ++j)
-      EXPECT_NEAR(adj_test::symmetricProductElement(original, inverse, i, j), i == j ? 1.0 : 0.0, tolerance);
+TSMatrix symmetric2(double s11, double s21, double s22) {
+  TSMatrix s(2);
+  s(1, 1) = s11;
+  s(2, 1) = s21;
+  s(2, 2) = s22;
+  return s;
 }
 
-TEST(CanInvert, PositiveDefiniteGivesFactorOfTheMatrix) {
+// A positive-definite matrix gives its factor: s = u^T u with u(k,k) = 1 / stored diagonal and u(k,i) the
+// stored upper row. Indefinite, singular and non-finite matrices are refused, and so is a pivot whose
+// 1/sqrt exceeds the bound (pivot 1e-4: 100 passes a bound of 100 and fails one of 99).
+TEST(CanInvert, FactorOfPositiveDefiniteAndRefusals) {
   std::mt19937 rng(3);
   const TSMatrix s = adj_test::randomPositiveDefinite(5, rng);
-  TSMatrix factor(s);
-  ASSERT_EQ(svy_math::CanInvert(factor, 1e6), 1);
-  // s = u^T u with u(k,k) = 1 / stored diagonal and u(k,i) the stored upper row.
-  auto u = [&factor](int k, int i) { return k == i ? 1.0 / factor(k, k) : (k < i ? factor(k, i) : 0.0); };
+  TSMatrix f(s);
+  ASSERT_EQ(svy_math::CanInvert(f, 1e6), 1);
+  svy_math::TMatrix u(5, 5);
+  for (int k = 1; k <= 5; ++k)
+    for (int i = k; i <= 5; ++i) u(k, i) = k == i ? 1.0 / f(k, k) : f(k, i);
+  const svy_math::TMatrix product = multiply(adj_test::transpose(u), u);
   for (int i = 1; i <= 5; ++i)
-    for (int j = 1; j <= 5; ++j) {
-      double sum = 0.0;
-      for (int k = 1; k <= 5; ++k) sum += u(k, i) * u(k, j);
-      EXPECT_NEAR(sum, s(i, j), 1e-12 * s(i, i));
+    for (int j = 1; j <= 5; ++j) EXPECT_NEAR(product(i, j), s(i, j), 1e-12 * s(i, i));
+  const struct {
+    TSMatrix s;
+    double bound;
+    int expected;
+  } cases[] = {{symmetric2(1, 2, 1), 1e6, 0},       {symmetric2(1, 1, 1), 1e6, 0},   {symmetric2(1, 0, 1e-4), 100, 1},
+               {symmetric2(1, 0, 1e-4), 99, 0},      {symmetric2(std::nan(""), 0, 1), 1e6, 0}};
+  for (const auto& c : cases) {
+    TSMatrix copy(c.s);
+    EXPECT_EQ(svy_math::CanInvert(copy, c.bound), c.expected) << c.s(2, 1) << " " << c.s(2, 2) << " " << c.bound;
+  }
+}
+
+// A 3x3 covariance: status and, when invertible, inverse times original is the identity; a singular one
+// is left as it was. A covariance in square metres passes: the determinant test (1e-60) is far below its 1e-16.
+TEST(InvertSMatr3, StatusAndInverse) {
+  const struct {
+    svy_math::covar c;
+    int expected;
+  } cases[] = {{svy_math::covar(4, 1, 5, 2, 3, 6), 0},
+               {svy_math::covar(4e-6, 1e-6, 9e-6, 0.0, 2e-6, 1e-5), 0},
+               {svy_math::covar(1, 2, 1, 0, 0, 1), -2},    // indefinite: det < 0
+               {svy_math::covar(-1, 0, -1, 0, 0, 1), -2},  // det > 0, diagonal negative
+               {svy_math::covar(1, 1, 1, 1, 1, 1), -1},
+               {svy_math::covar(), -1}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(::testing::Message() << c.c.c[0] << " " << c.c.c[1] << " " << c.c.c[2]);
+    svy_math::covar inverse(c.c);
+    ASSERT_EQ(svy_math::InvertSMatr3(inverse), c.expected);
+    if (c.expected == 0) adj_test::expectIdentity(svy_math::matr3_3(c.c) * svy_math::matr3_3(inverse), 1e-9);
+    if (c.expected == -1) {
+      for (int k = 0; k < 6; ++k) EXPECT_EQ(inverse.c[k], c.c.c[k]);
     }
-}
-
-TEST(CanInvert, RefusesIndefiniteSingularAndWeakPivots) {
-  TSMatrix indefinite(2);
-  indefinite(1, 1) = 1.0;
-  indefinite(2, 1) = 2.0;
-  indefinite(2, 2) = 1.0;
-  EXPECT_EQ(svy_math::CanInvert(indefinite, 1e6), 0);
-  TSMatrix singular(2);
-  singular = 1.0;
-  EXPECT_EQ(svy_math::CanInvert(singular, 1e6), 0);
-  // Pivot 1e-4: 1/sqrt(pivot) = 100 passes a bound of 100 and fails one of 99.
-  TSMatrix weak(2);
-  weak(1, 1) = 1.0;
-  weak(2, 2) = 1e-4;
-  TSMatrix copy(weak);
-  EXPECT_EQ(svy_math::CanInvert(weak, 100.0), 1);
-  EXPECT_EQ(svy_math::CanInvert(copy, 99.0), 0);
-  TSMatrix notFinite(2);
-  notFinite(1, 1) = std::nan("");
-  EXPECT_EQ(svy_math::CanInvert(notFinite, 1e6), 0);
-}
-
-struct SMatr3Case {
-  svy_math::covar c;
-  int expected;
-};
-
-class InvertSMatr3Test : public ::testing::TestWithParam<SMatr3Case> {};
-
-TEST_P(InvertSMatr3Test, StatusAndInverse) {
-  const SMatr3Case& param = GetParam();
-  svy_math::covar c(param.c);
-  ASSERT_EQ(svy_math::InvertSMatr3(c), param.expected);
-  if (param.expected == -1) {
-    for (int k = 0; k < 6; ++k) EXPECT_EQ(c.c[k], param.c.c[k]);
-    return;
   }
-  const svy_math::matr3_3 product = svy_math::matr3_3(param.c) * svy_math::matr3_3(c);
-  adj_test::expectIdentity(product, 1e-9);
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Table, InvertSMatr3Test,
-    ::testing::Values(SMatr3Case{svy_math::covar(4, 1, 5, 2, 3, 6), 0},
-                      // A covariance in square metres: the determinant test (1e-60) is far below its 1e-16.
-                      SMatr3Case{svy_math::covar(4e-6, 1e-6, 9e-6, 0.0, 2e-6, 1e-5), 0},
-                      SMatr3Case{svy_math::covar(1, 2, 1, 0, 0, 1), -2},   // indefinite: det < 0
-                      SMatr3Case{svy_math::covar(-1, 0, -1, 0, 0, 1), -2},  // det > 0, diagonal negative
-                      SMatr3Case{svy_math::covar(1, 1, 1, 1, 1, 1), -1},
-                      SMatr3Case{svy_math::covar(), -1}));
-
-TEST(RareInversion, BandedMatrixAndProfile) {
-  const int n = 8;
-  TSMatrix s(n);
-  for (int i = 1; i <= n; ++i) {
-    s(i, i) = 4.0 + i;
-    if (i > 1) s(i, i - 1) = -1.0;
-    if (i > 3 && i % 2 == 0) s(i, i - 3) = 0.5;
+// Inverse times original is the identity for a banded matrix (with its profile: the first non-zero column
+// of each row, counted back from the diagonal) and random dense ones; a singular matrix is refused untouched.
+TEST(RareInversion, InverseTimesOriginalAndRefusal) {
+  TSMatrix band(8);
+  for (int i = 1; i <= 8; ++i) {
+    band(i, i) = 4.0 + i;
+    if (i > 1) band(i, i - 1) = -1.0;
+    if (i > 3 && i % 2 == 0) band(i, i - 3) = 0.5;
   }
-  TSMatrix inverse(s);
-  int profile[n];
-  ASSERT_EQ(svy_math::RareInversion(inverse, profile, n), 0);
-  expectInverseOf(s, inverse, 1e-14);
-  EXPECT_EQ(profile[0], 1);
-  EXPECT_EQ(profile[2], 2);
-  EXPECT_EQ(profile[3], 1);
-  EXPECT_EQ(profile[5], 3);
-}
-
-TEST(RareInversion, RandomDenseAndRefusals) {
+  TSMatrix inverse(band);
+  int profile[8];
+  ASSERT_EQ(svy_math::RareInversion(inverse, profile, 8), 0);
+  adj_test::expectInverseOf(band, inverse, 1e-14);
+  EXPECT_TRUE(profile[0] == 1 && profile[2] == 2 && profile[3] == 1 && profile[5] == 3);
   std::mt19937 rng(17);
   for (int n : {1, 2, 6, 12}) {
     const TSMatrix s = adj_test::randomPositiveDefinite(n, rng);
-    TSMatrix inverse(s);
-    ASSERT_EQ(svy_math::RareInversion(inverse, nullptr, 0), 0);
-    expectInverseOf(s, inverse, 1e-12);
+    TSMatrix dense(s);
+    ASSERT_EQ(svy_math::RareInversion(dense, nullptr, 0), 0);
+    adj_test::expectInverseOf(s, dense, 1e-12);
   }
   TSMatrix singular(3);
   singular = 2.0;
@@ -113,33 +96,24 @@ TEST(RareInversion, RandomDenseAndRefusals) {
   EXPECT_EQ(singular(3, 1), 2.0);
 }
 
-TEST(PseudoInversion, RankDeficientMatrixSatisfiesPenroseConditions) {
-  // s = b^T b for a 2 x 4 matrix b: rank 2 of order 4.
+// A rank-2 matrix of order 4 (b^T b, b 2x4), with the defect found or given: the Penrose conditions
+// s s+ s = s and s+ s s+ = s+. A regular matrix gets its inverse; a defect above the order is refused.
+TEST(PseudoInversion, PenroseConditionsAndRegularInverse) {
   std::mt19937 rng(21);
-  const svy_math::TMatrix b = adj_test::randomMatrix(2, 4, rng);
+  const svy_math::TMatrix b = adj_test::randomMatrix(2, 4, rng), bb = multiply(adj_test::transpose(b), b);
   TSMatrix s(4);
   for (int i = 1; i <= 4; ++i)
-    for (int j = 1; j <= i; ++j) s(i, j) = b(1, i) * b(1, j) + b(2, i) * b(2, j);
+    for (int j = 1; j <= i; ++j) s(i, j) = bb(i, j);
   for (int defect : {-1, 2}) {
     TSMatrix pinv(s);
     ASSERT_EQ(svy_math::PseudoInversion(pinv, defect), 2);
-    // s s+ s = s and s+ s s+ = s+.
-    for (int i = 1; i <= 4; ++i)
-      for (int j = 1; j <= 4; ++j) {
-        double sps = 0.0;
-        double psp = 0.0;
-        for (int k = 1; k <= 4; ++k) {
-          sps += adj_test::symmetricProductElement(s, pinv, i, k) * s(k, j);
-          psp += adj_test::symmetricProductElement(pinv, s, i, k) * pinv(k, j);
-        }
-        EXPECT_NEAR(sps, s(i, j), 1e-12);
-        EXPECT_NEAR(psp, pinv(i, j), 1e-9);
-      }
+    adj_test::expectNear(multiply(multiply(full(s), full(pinv)), full(s)), full(s), 1e-12);
+    adj_test::expectNear(multiply(multiply(full(pinv), full(s)), full(pinv)), full(pinv), 1e-9);
   }
   const TSMatrix regular = adj_test::randomPositiveDefinite(3, rng);
   TSMatrix pinv(regular);
   ASSERT_EQ(svy_math::PseudoInversion(pinv, -1), 3);
-  expectInverseOf(regular, pinv, 1e-12);
+  adj_test::expectInverseOf(regular, pinv, 1e-12);
   EXPECT_EQ(svy_math::PseudoInversion(pinv, 4), -1);
 }
 

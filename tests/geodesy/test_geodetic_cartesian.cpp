@@ -50,9 +50,8 @@ TEST(GeodeticCartesian, MatchesIndependentLibraryOverGlobalGrid) {
         const Coord expected(x, y, z);
         ASSERT_LT(distance(toCartesian(lat, lon, h), expected), kForwardTol) << lat << " " << lon << " " << h;
         const GeoCoord g = toGeodetic(expected);
-        double xb = 0, yb = 0, zb = 0;
-        earth.Forward(g.lat() / kDegToRad, g.lon() / kDegToRad, g.height(), xb, yb, zb);
-        ASSERT_LT(distance(Coord(xb, yb, zb), expected), kReverseTol) << lat << " " << lon << " " << h;
+        earth.Forward(g.lat() / kDegToRad, g.lon() / kDegToRad, g.height(), x, y, z);
+        ASSERT_LT(distance(Coord(x, y, z), expected), kReverseTol) << lat << " " << lon << " " << h;
         ASSERT_NEAR(g.height(), h, kReverseTol);
       }
     }
@@ -66,48 +65,41 @@ TEST(GeodeticCartesian, MatchesReferenceTableForTheStoredEccentricity) {
   SVY_SKIP_WITHOUT_REFDATA();
   const svy_test::CsvTable t = svy_test::readCsvTable(svy_test::refdataPath("geodetic/geodetic_ecef_cartconvert.csv"));
   ASSERT_EQ(t.rows.size(), 516u);
+  const auto at = [&t](const std::vector<double>& row, const char* x, const char* y, const char* z) {
+    return Coord(row[t.column(x)], row[t.column(y)], row[t.column(z)]);
+  };
   double largestEllipsoidDifference = 0.0;
   for (const auto& row : t.rows) {
-    const Coord expected(row[t.column("X_e0818191913305")], row[t.column("Y_e0818191913305")],
-                         row[t.column("Z_e0818191913305")]);
+    const Coord expected = at(row, "X_e0818191913305", "Y_e0818191913305", "Z_e0818191913305");
     const Coord c = toCartesian(row[t.column("lat_deg")], row[t.column("lon_deg")], row[t.column("h_m")]);
     ASSERT_LT(distance(c, expected), kForwardTol) << row[0] << " " << row[1] << " " << row[2];
     ASSERT_LT(distance(toCartesian(0, 0, 0).blh2xyz(toGeodetic(expected)), expected), kReverseTol);
-    const Coord usual(row[t.column("X_wgs84")], row[t.column("Y_wgs84")], row[t.column("Z_wgs84")]);
-    largestEllipsoidDifference = std::max(largestEllipsoidDifference, distance(c, usual));
+    largestEllipsoidDifference = std::max(largestEllipsoidDifference, distance(c, at(row, "X_wgs84", "Y_wgs84", "Z_wgs84")));
   }
   EXPECT_GT(largestEllipsoidDifference, 1e-4);
   EXPECT_LT(largestEllipsoidDifference, 5e-4);
 }
 
-struct SpecialPosition {
-  Coord xyz;
-  double lat, lon, h;
-};
-
-class GeodeticSpecialPosition : public ::testing::TestWithParam<SpecialPosition> {};
-
-// The equator on the prime meridian; the centre of the earth (h = -a); the polar axis, within 1e-10 m of it,
-// where the height is |Z| - b; a western longitude, which comes back increased by 2 pi.
-TEST_P(GeodeticSpecialPosition, GivesTheStatedGeodeticCoordinates) {
-  const SpecialPosition& c = GetParam();
-  const GeoCoord g = toGeodetic(c.xyz);
-  EXPECT_NEAR(g.lat(), c.lat, 1e-12);
-  EXPECT_NEAR(g.lon(), c.lon, 1e-15);
-  EXPECT_NEAR(g.height(), c.h, kReverseTol);
-}
-
-const double kB = std::sqrt(1.0 - 0.0818191913305 * 0.0818191913305) * 6378137.0;
-INSTANTIATE_TEST_SUITE_P(
-    AxesCentreAndWest, GeodeticSpecialPosition,
-    ::testing::Values(SpecialPosition{Coord(6378137.0, 0, 0), 0, 0, 0}, SpecialPosition{Coord(0, 0, 0), 0, 0, -6378137.0},
-                      SpecialPosition{Coord(0, 0, 7e6), kHalfPi, 0, 7e6 - kB},
-                      SpecialPosition{Coord(5e-11, 0, -10.0), -kHalfPi, 0, 10.0 - kB},
-                      SpecialPosition{toCartesian(10.0, -75.5, 10.0), 10.0 * kDegToRad, 284.5 * kDegToRad, 10.0}));
-
-TEST(GeodeticCartesian, EquatorPrimeMeridianIsExactlyOnTheXAxis) {
-  const Coord c = toCartesian(0.0, 0.0, 0.0);
-  EXPECT_EQ(c, Coord(6378137.0, 0.0, 0.0));
+// The equator on the prime meridian (exactly on the X axis both ways); the centre of the earth (h = -a); the
+// polar axis, within 1e-10 m of it, where the height is |Z| - b; a western longitude, which comes back
+// increased by 2 pi.
+TEST(GeodeticCartesian, SpecialPositions) {
+  EXPECT_EQ(toCartesian(0.0, 0.0, 0.0), Coord(6378137.0, 0.0, 0.0));
+  const double b = std::sqrt(1.0 - 0.0818191913305 * 0.0818191913305) * 6378137.0;
+  const struct {
+    Coord xyz;
+    double lat, lon, h;
+  } cases[] = {{Coord(6378137.0, 0, 0), 0, 0, 0},
+               {Coord(0, 0, 0), 0, 0, -6378137.0},
+               {Coord(0, 0, 7e6), kHalfPi, 0, 7e6 - b},
+               {Coord(5e-11, 0, -10.0), -kHalfPi, 0, 10.0 - b},
+               {toCartesian(10.0, -75.5, 10.0), 10.0 * kDegToRad, 284.5 * kDegToRad, 10.0}};
+  for (const auto& c : cases) {
+    const GeoCoord g = toGeodetic(c.xyz);
+    EXPECT_NEAR(g.lat(), c.lat, 1e-12) << c.xyz.x() << " " << c.xyz.z();
+    EXPECT_NEAR(g.lon(), c.lon, 1e-15);
+    EXPECT_NEAR(g.height(), c.h, kReverseTol);
+  }
 }
 
 // Non-finite input gives NaN at once. Absurd finite input terminates: squares that overflow, a huge Z just
@@ -122,8 +114,7 @@ TEST(GeodeticCartesian, NonFiniteAndAbsurdInputEnds) {
   EXPECT_FALSE(std::isnan(toGeodetic(Coord(1e300, 1e300, 1e300)).lon()));
   const GeoCoord steep = toGeodetic(Coord(2e-10, 0.0, 1e300));
   EXPECT_TRUE(std::isnan(steep.lat()) || std::fabs(steep.lat()) <= kHalfPi);
-  const GeoCoord deep = toGeodetic(Coord(42697.673, 0.0, 6.9e-6));
-  EXPECT_LT(std::fabs(deep.lat()), 0.01);
+  EXPECT_LT(std::fabs(toGeodetic(Coord(42697.673, 0.0, 6.9e-6)).lat()), 0.01);
 }
 
 }  // namespace
