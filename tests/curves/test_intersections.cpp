@@ -5,6 +5,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <initializer_list>
+#include <string>
 
 #include "curve_test_support.h"
 #include "svymath/curves/generic_line_impl.h"
@@ -32,49 +34,38 @@ void expectSamePoints(svy_vector<C2dPos> a, svy_vector<C2dPos> b, double toleran
   for (std::size_t i = 0; i < a.size(); ++i) curve_test::expectPosNear(a[i], b[i].north(), b[i].east(), tolerance);
 }
 
-struct LineLineCase {
-  C2dPos a0, a1, b0, b1;
-  EIntersectionType type;
-  int hits;
-  C2dPos expected;
-};
-
-class LineLineTest : public ::testing::TestWithParam<LineLineCase> {};
-
-TEST_P(LineLineTest, CrossingsByCase) {
-  const LineLineCase& c = GetParam();
-  const CGenericLineImpl a(c.a0, c.a1, c.type);
-  const svy_math::TLine b(c.b0, c.b1);
-  svy_vector<C2dPos> out(1, C2dPos(-9.0, -9.0));  // results are appended
-  EXPECT_EQ(a.calcIntersections(b, out), c.hits > 0);
-  ASSERT_EQ(out.size(), static_cast<std::size_t>(1 + c.hits));
-  if (c.hits == 1) curve_test::expectPosNear(out[1], c.expected.north(), c.expected.east(), 1e-9);
-  if (c.type == eIntersectOnSegment) expectSamePoints(crossings(a, b), crossings(b, a), 1e-9);
+// Line with line: general, north-south with east-west either way round and with a slanted line, parallel and
+// collinear, prolonged lines only, touching at an end and just short of it within the tolerance.
+TEST(LineLineIntersection, CrossingsByCase) {
+  const struct {
+    C2dPos a0, a1, b0, b1;
+    EIntersectionType type;
+    int hits;
+    C2dPos expected;
+  } cases[] = {
+      {{0, 0}, {10, 10}, {0, 10}, {10, 0}, eIntersectOnSegment, 1, {5, 5}},
+      {{-5, 2}, {5, 2}, {1, -3}, {1, 3}, eIntersectOnSegment, 1, {1, 2}},
+      {{1, -3}, {1, 3}, {-5, 2}, {5, 2}, eIntersectOnSegment, 1, {1, 2}},
+      {{0, 4}, {10, 4}, {0, 0}, {8, 8}, eIntersectOnSegment, 1, {4, 4}},
+      {{0, 0}, {10, 10}, {1, 0}, {11, 10}, eIntersectOnSegment, 0, {}},
+      {{0, 0}, {10, 0}, {0, 5}, {10, 5}, eIntersectOnSegment, 0, {}},
+      {{0, 0}, {1, 1}, {0, 10}, {10, 0}, eIntersectOnSegment, 0, {}},
+      {{0, 0}, {1, 1}, {0, 10}, {10, 0}, eIntersectUnbounded, 1, {5, 5}},
+      {{0, 0}, {5, 5}, {0, 10}, {10, 0}, eIntersectOnSegment, 1, {5, 5}},
+      {{0, 0}, {4.9995, 4.9995}, {0, 10}, {10, 0}, eIntersectOnSegmentTol, 1, {5, 5}},
+      {{5000000, 500000}, {5000100, 500100}, {5000000, 500100}, {5000100, 500000}, eIntersectOnSegment, 1,
+       {5000050, 500050}}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(std::to_string(c.a1.north()) + " " + std::to_string(c.b0.east()));
+    const CGenericLineImpl a(c.a0, c.a1, c.type);
+    const svy_math::TLine b(c.b0, c.b1);
+    svy_vector<C2dPos> out(1, C2dPos(-9.0, -9.0));  // results are appended
+    EXPECT_EQ(a.calcIntersections(b, out), c.hits > 0);
+    ASSERT_EQ(out.size(), static_cast<std::size_t>(1 + c.hits));
+    if (c.hits == 1) curve_test::expectPosNear(out[1], c.expected.north(), c.expected.east(), 1e-9);
+    if (c.type == eIntersectOnSegment) expectSamePoints(crossings(a, b), crossings(b, a), 1e-9);
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Table, LineLineTest,
-    ::testing::Values(
-        // general crossing
-        LineLineCase{C2dPos(0, 0), C2dPos(10, 10), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegment, 1, C2dPos(5, 5)},
-        // north-south with east-west, either way round
-        LineLineCase{C2dPos(-5, 2), C2dPos(5, 2), C2dPos(1, -3), C2dPos(1, 3), eIntersectOnSegment, 1, C2dPos(1, 2)},
-        LineLineCase{C2dPos(1, -3), C2dPos(1, 3), C2dPos(-5, 2), C2dPos(5, 2), eIntersectOnSegment, 1, C2dPos(1, 2)},
-        // north-south with a slanted line
-        LineLineCase{C2dPos(0, 4), C2dPos(10, 4), C2dPos(0, 0), C2dPos(8, 8), eIntersectOnSegment, 1, C2dPos(4, 4)},
-        // parallel and collinear
-        LineLineCase{C2dPos(0, 0), C2dPos(10, 10), C2dPos(1, 0), C2dPos(11, 10), eIntersectOnSegment, 0, C2dPos()},
-        LineLineCase{C2dPos(0, 0), C2dPos(10, 0), C2dPos(0, 5), C2dPos(10, 5), eIntersectOnSegment, 0, C2dPos()},
-        // crossing of the prolonged lines only
-        LineLineCase{C2dPos(0, 0), C2dPos(1, 1), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegment, 0, C2dPos()},
-        LineLineCase{C2dPos(0, 0), C2dPos(1, 1), C2dPos(0, 10), C2dPos(10, 0), eIntersectUnbounded, 1, C2dPos(5, 5)},
-        // touching at an end, and just short of it within the tolerance
-        LineLineCase{C2dPos(0, 0), C2dPos(5, 5), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegment, 1, C2dPos(5, 5)},
-        LineLineCase{C2dPos(0, 0), C2dPos(4.9995, 4.9995), C2dPos(0, 10), C2dPos(10, 0), eIntersectOnSegmentTol, 1,
-                     C2dPos(5, 5)},
-        // survey coordinates
-        LineLineCase{C2dPos(5000000, 500000), C2dPos(5000100, 500100), C2dPos(5000000, 500100), C2dPos(5000100, 500000),
-                     eIntersectOnSegment, 1, C2dPos(5000050, 500050)}));
 
 TEST(LineArcIntersection, TwoCrossingsTangencyMissAndSweep) {
   const CCurveArc circleArc = makeArc(0.0, 0.0, 0.0, 100.0, 50.0, true);  // centre (0, 50)
@@ -196,18 +187,14 @@ TEST(SpiralIntersection, SpiralWithArcAndSpiralWithSpiral) {
 }
 
 // The visitors see each segment as its own kind.
-class KindCounter : public CGenericSegmentVisitor_const {
- public:
+struct KindCounter : CGenericSegmentVisitor_const {
   void Visit(const CGenericLine&) override { ++lines; }
   void Visit(const CGenericArc&) override { ++arcs; }
   void Visit(const CGenericSpiral&) override { ++spirals; }
-  int lines = 0;
-  int arcs = 0;
-  int spirals = 0;
+  int lines = 0, arcs = 0, spirals = 0;
 };
 
-class Retyper : public CGenericSegmentVisitor {
- public:
+struct Retyper : CGenericSegmentVisitor {
   void Visit(CGenericLine& line) override { line.setIntersectionType(eIntersectUnbounded); }
   void Visit(CGenericArc& arc) override { arc.setIntersectionType(eIntersectOnSegment); }
   void Visit(CGenericSpiral& spiral) override { spiral.setIntersectionType(eIntersectOnSegmentTol); }
@@ -218,10 +205,9 @@ TEST(SegmentVisitor, AcceptDispatchesOnTheKind) {
   CCurveArc arc = makeArc(0.0, 0.0, 0.0, 10.0, 20.0, true);
   CCurveSpiral spiral = makeSpiral(0.0, 0.0, 0.0, 10.0, 20.0, true, true);
   svy_math::TLine tline(C2dPos(0.0, 0.0), C2dPos(1.0, 0.0));
-  CGenericSegment* all[] = {&segment, &arc, &spiral, &tline};
   KindCounter counter;
   Retyper retyper;
-  for (CGenericSegment* s : all) {
+  for (CGenericSegment* s : std::initializer_list<CGenericSegment*>{&segment, &arc, &spiral, &tline}) {
     s->Accept(counter);
     s->Accept(retyper);
   }
@@ -230,6 +216,7 @@ TEST(SegmentVisitor, AcceptDispatchesOnTheKind) {
   EXPECT_EQ(counter.spirals, 1);
   EXPECT_EQ(tline.getIntersectionType(), eIntersectUnbounded);
   EXPECT_EQ(arc.getIntersectionType(), eIntersectOnSegment);
+  EXPECT_EQ(spiral.getIntersectionType(), eIntersectOnSegmentTol);
 }
 
 }  // namespace
