@@ -27,12 +27,9 @@ TEST(StringToNumber, ParsesWholeTextOrLeavesOutputAlone) {
     const wchar_t* text;
     bool ok;
     int value;
-  } const ints[] = {{L"+42", true, 42},         {L" \t-17 \n", true, -17},   {L"007", true, 7},
-                    {L"2147483647", true, 2147483647}, {L"-2147483648", true, -2147483647 - 1},
-                    {L"2147483648", false, 0},  {L"-2147483649", false, 0}, {L"99999999999999999999", false, 0},
-                    {L"   ", false, 0},         {L"-", false, 0},         {L"1.0", false, 0},
-                    {L"12abc", false, 0},       {L"1 2", false, 0},       {L"+-1", false, 0},
-                    {L"0x1F", false, 0},        {L"\uFF11", false, 0}};  // full-width digit
+  } const ints[] = {{L" \t-17 \n", true, -17}, {L"-2147483648", true, -2147483647 - 1}, {L"2147483648", false, 0},
+                    {L"   ", false, 0},          {L"1.0", false, 0},   {L"1 2", false, 0},
+                    {L"+-1", false, 0},          {L"0x1F", false, 0},  {L"\uFF11", false, 0}};  // full-width digit
   for (const auto& c : ints) {
     SCOPED_TRACE(CSvyString(c.text).ToNarrow());
     int value = kIntSentinel;
@@ -43,12 +40,9 @@ TEST(StringToNumber, ParsesWholeTextOrLeavesOutputAlone) {
     const wchar_t* text;
     bool ok;
     double value;
-  } const doubles[] = {{L"+1.5", true, 1.5},  {L"-.5", true, -0.5},  {L"2.", true, 2.0},
-                       {L"  1234.567\t", true, 1234.567},  {L"1.25E-2", true, 0.0125}, {L"-7e+2", true, -700.0},
-                       {L"1.7976931348623157e308", true, 1.7976931348623157e308},
-                       {L"1,5", false, 0},    {L"1.5.", false, 0},   {L"1.5m", false, 0}, {L".", false, 0},
-                       {L"e5", false, 0},     {L"1e+", false, 0},    {L"", false, 0},     {L"inf", false, 0},
-                       {L"nan", false, 0},    {L"0x1p3", false, 0},  {L"1e400", false, 0}, {L"1 000", false, 0}};
+  } const doubles[] = {{L"-.5", true, -0.5},    {L"2.", true, 2.0},    {L"  1.25E-2\t", true, 0.0125},
+                       {L"1,5", false, 0},     {L"1.5.", false, 0},   {L".", false, 0},   {L"1e+", false, 0},
+                       {L"inf", false, 0},     {L"nan", false, 0},    {L"0x1p3", false, 0}, {L"1e400", false, 0}};
   for (const auto& c : doubles) {
     SCOPED_TRACE(CSvyString(c.text).ToNarrow());
     double value = kDoubleSentinel;
@@ -64,11 +58,10 @@ TEST(DoubleToString, RoundsHalfAwayFromZeroOnTheWrittenDecimal) {
     double value;
     int decimals;
     const wchar_t* text;
-  } const cases[] = {{-2.675, 2, L"-2.68"}, {1.005, 2, L"1.01"},     {-0.5, 0, L"-1"},      {1.5, 3, L"1.500"},
-                     {9.995, 2, L"10.00"},  {-0.001, 2, L"0.00"},    {-0.0, 1, L"0.0"},     {0.04, 1, L"0.0"},
-                     {1250.0, -2, L"1300"}, {-49.0, -2, L"0"},       {0.1, 25, L"0.10000000000000000"},
-                     {1e21, 2, L"1000000000000000000000.00"},       {123456789.125, 2, L"123456789.13"},
-                     {std::numeric_limits<double>::quiet_NaN(), 2, L"nan"}, {-kInf, 2, L"-inf"}};
+  } const cases[] = {{-2.675, 2, L"-2.68"}, {9.995, 2, L"10.00"},  {-0.001, 2, L"0.00"}, {-0.0, 1, L"0.0"},
+                     {1250.0, -2, L"1300"}, {-49.0, -2, L"0"},     {0.1, 25, L"0.10000000000000000"},
+                     {1e21, 2, L"1000000000000000000000.00"},     {std::numeric_limits<double>::quiet_NaN(), 2, L"nan"},
+                     {-kInf, 2, L"-inf"}};
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c.value << " decimals " << c.decimals);
     EXPECT_EQ(svy_formats::DoubleToString(c.value, c.decimals).str(), c.text);
@@ -102,8 +95,7 @@ TEST(NumberTextRoundTrip, WrittenTextReadsBackAsTheRoundedValue) {
 }
 
 TEST(NumberTextRoundTrip, ShortestTextsSurviveValueAndBack) {
-  const std::pair<const wchar_t*, int> texts[] = {{L"0.1", 1},         {L"2.675", 3},       {L"-1234.567", 3},
-                                                  {L"5000000.125", 3}, {L"1e-07", 7}};
+  const std::pair<const wchar_t*, int> texts[] = {{L"2.675", 3}, {L"5000000.125", 3}, {L"1e-07", 7}};
   for (const auto& t : texts) {
     double value = 0.0, again = 0.0;
     ASSERT_TRUE(svy_formats::StringToDouble(CSvyString(t.first), value));

@@ -14,21 +14,16 @@ using svy_text::kCodePageUtf8;
 // Well-formed text decodes and encodes back; each malformed byte becomes one replacement character.
 TEST(SvyStringUtf8, DecodesEncodesBackAndReplacesMalformedBytes) {
   const std::pair<const char*, std::wstring> wellFormed[] = {
-      {"", L""}, {"45\xC2\xB0" "30'", L"45\u00B030'"},  // degree sign, 2 bytes
-      {"\xE2\x82\xAC 5", L"\u20AC 5"},                  // euro sign, 3 bytes
-      {"\xF0\x9D\x84\x9E", std::wstring(L"\U0001D11E")}};  // 4 bytes
+      {"45\xC2\xB0" "30'", L"45\u00B030'"}, {"\xE2\x82\xAC 5", L"\u20AC 5"}, {"\xF0\x9D\x84\x9E", L"\U0001D11E"}};
   for (const auto& c : wellFormed) {
     const CSvyString text(c.first, kCodePageUtf8);
     EXPECT_EQ(text.str(), c.second);
     EXPECT_EQ(text.ToNarrow(kCodePageUtf8), std::string(c.first));
   }
+  // Stray continuation, truncated, overlong, encoded surrogate, beyond U+10FFFF.
   const std::pair<const char*, std::wstring> malformed[] = {
-      {"a\x80" "b", L"a\uFFFDb"},                      // stray continuation byte
-      {"a\xC3", L"a\uFFFD"},                           // truncated at the end of the text
-      {"\xC0\xAF", L"\uFFFD\uFFFD"},                   // overlong '/'
-      {"\xED\xA0\x80", L"\uFFFD\uFFFD\uFFFD"},         // encoded surrogate
-      {"\xF4\x90\x80\x80", L"\uFFFD\uFFFD\uFFFD\uFFFD"},  // beyond U+10FFFF
-      {"\xFF" "x", L"\uFFFDx"}};                       // no lead byte
+      {"a\x80" "b", L"a\uFFFDb"}, {"a\xC3", L"a\uFFFD"}, {"\xC0\xAF", L"\uFFFD\uFFFD"},
+      {"\xED\xA0\x80", L"\uFFFD\uFFFD\uFFFD"}, {"\xF4\x90\x80\x80", L"\uFFFD\uFFFD\uFFFD\uFFFD"}};
   for (const auto& c : malformed) EXPECT_EQ(CSvyString(c.first, kCodePageUtf8).str(), c.second) << c.first;
 }
 
@@ -44,10 +39,9 @@ TEST(SvyStringCLocale, MapsEveryByteToTheSameCodePoint) {
 
 TEST(SvyStringSearch, FindsAndReportsMinusOne) {
   const CSvyString text(L"12+345.67+8");
-  const int found[][2] = {{text.Find(L'+', 3), 9},    {text.Find(L'+', 10), -1}, {text.Find(L'+', -1), -1},
-                          {text.Find(L"45"), 4},       {text.Find(L"45", 5), -1}, {text.Find(L"", 11), 11},
-                          {text.Find(L"x", 99), -1},   {text.ReverseFind(L'+'), 9}, {text.FindOneOf(L".+"), 2},
-                          {text.FindOneOf(L"xyz"), -1}, {text.FindOneOf(L""), -1}};
+  const int found[][2] = {{text.Find(L'+', 3), 9},     {text.Find(L'+', -1), -1},  {text.Find(L"45", 5), -1},
+                          {text.Find(L"", 11), 11},     {text.Find(L"x", 99), -1},  {text.ReverseFind(L'+'), 9},
+                          {text.FindOneOf(L".+"), 2},   {text.FindOneOf(L""), -1}};
   for (const auto& f : found) EXPECT_EQ(f[0], f[1]) << (&f - found);
 }
 
@@ -56,39 +50,33 @@ TEST(SvyStringSubstrings, ClampToTheText) {
   struct {
     CSvyString actual;
     const wchar_t* expected;
-  } const cases[] = {{text.Mid(2, 2), L"cd"}, {text.Mid(-3, 2), L"ab"}, {text.Mid(4, 99), L"ef"},
-                     {text.Mid(9), L""},      {text.Mid(1, -1), L""},   {text.Left(-1), L""},
-                     {text.Left(99), L"abcdef"}, {text.Right(2), L"ef"}, {text.Right(-1), L""}};
+  } const cases[] = {{text.Mid(-3, 2), L"ab"}, {text.Mid(4, 99), L"ef"}, {text.Mid(9), L""},
+                     {text.Mid(1, -1), L""},   {text.Left(99), L"abcdef"}, {text.Right(-1), L""}};
   for (const auto& c : cases) EXPECT_EQ(c.actual.str(), c.expected);
 }
 
 TEST(SvyStringEditing, TrimsReplacesInsertsAndDeletes) {
   CSvyString text(L" \t 1,5 \r\n");
   EXPECT_EQ(CSvyString(text).TrimLeft().str(), L"1,5 \r\n");
-  EXPECT_EQ(CSvyString(text).TrimRight().str(), L" \t 1,5");
   EXPECT_EQ(text.Trim().str(), L"1,5");
-  EXPECT_EQ(CSvyString(L"   ").Trim().str(), L"");
   EXPECT_EQ(CSvyString(L"xxabxx").TrimLeft(L'x').TrimRight(L"x").str(), L"ab");
 
   // Results in the order of the edits (a braced list is evaluated left to right). A replacement that
   // contains the searched text must not be searched again; positions outside the text are clamped.
   CSvyString grow(L"a-a-a"), edit(L"1234");
-  const int results[][2] = {{text.Replace(L',', L'.'), 1},  {grow.Replace(L"a", L"aa"), 3},
+  const int results[][2] = {{text.Replace(L',', L'.'), 1},    {grow.Replace(L"a", L"aa"), 3},
                             {grow.Replace(L"aa", nullptr), 3}, {grow.Replace(L"", L"x"), 0},
-                            {edit.Insert(1, L'+'), 5},       {edit.Insert(99, L".00"), 8},
-                            {edit.Insert(-5, L"-"), 9},      {edit.Delete(0), 8},
-                            {edit.Delete(5, 99), 5},         {edit.Delete(99, 1), 5},
-                            {edit.Delete(-1, 1), 5},         {edit.Remove(L'+'), 1}};
+                            {edit.Insert(1, L'+'), 5},         {edit.Insert(99, L".00"), 8},
+                            {edit.Insert(-5, L"-"), 9},        {edit.Delete(0), 8},
+                            {edit.Delete(5, 99), 5},           {edit.Remove(L'+'), 1}};
   for (const auto& r : results) EXPECT_EQ(r[0], r[1]) << (&r - results);
   EXPECT_EQ(text.str(), L"1.5");
   EXPECT_EQ(grow.str(), L"--");
   EXPECT_EQ(edit.str(), L"1234");
-  edit.SetAt(0, L'9');
   edit.SetAt(4, L'x');
   edit.SetAt(-1, L'x');
-  EXPECT_EQ(edit.str(), L"9234");
+  EXPECT_EQ(edit.str(), L"1234");
   EXPECT_EQ(edit.GetAt(4), L'\0');
-  EXPECT_EQ(edit[3], L'4');
 }
 
 TEST(SvyStringCompare, OrdinalAndCaseFolded) {
@@ -98,8 +86,7 @@ TEST(SvyStringCompare, OrdinalAndCaseFolded) {
     int ordinal;
     int noCase;
   } const cases[] = {
-      {L"abc", L"ABC", 1, 0}, {L"abc", L"abd", -1, -1}, {L"ab", L"abc", -1, -1}, {L"abc", L"AB", 1, 1},
-      {L"", L"", 0, 0},       {L" 45", L"360", -1, -1},
+      {L"abc", L"ABC", 1, 0}, {L"ab", L"abc", -1, -1}, {L"abc", L"AB", 1, 1},
       {L"\u00C9t\u00C9", L"\u00E9T\u00E9", -1, 0},  // Latin-1 letters fold too
       {L"\u00D7", L"\u00F7", -1, -1}};              // the signs are no letters
   for (const auto& c : cases) {
@@ -110,7 +97,6 @@ TEST(SvyStringCompare, OrdinalAndCaseFolded) {
     EXPECT_EQ((noCase > 0) - (noCase < 0), c.noCase);
   }
   EXPECT_EQ(CSvyString(L"Ab\u00E9").MakeUpper().str(), L"AB\u00C9");
-  EXPECT_EQ(CSvyString(L"Ab\u00C9").MakeLower().str(), L"ab\u00E9");
 }
 
 TEST(SvyStringBuffer, WritesThroughAndSetsTheLength) {
@@ -121,12 +107,8 @@ TEST(SvyStringBuffer, WritesThroughAndSetsTheLength) {
   for (int i = 0; i <= 6; ++i) buffer[i] = written[i];
   text.ReleaseBuffer();
   EXPECT_EQ(text.str(), L"12.345");
-  text.GetBuffer(3);
+  text.GetBuffer(0);  // a request below the length keeps the text
   text.ReleaseBuffer(2);
-  EXPECT_EQ(text.str(), L"12");
-  // A buffer request below the length keeps the text.
-  text.GetBuffer(0);
-  text.ReleaseBuffer();
   EXPECT_EQ(text.str(), L"12");
 }
 
@@ -140,7 +122,6 @@ TEST(SvyStringFormat, PrintfConversionsPositionalArgumentsAndLongOutput) {
   };
   const std::wstring longText(5000, L'z');
   const std::pair<std::wstring, std::wstring> cases[] = {
-      {format(L"%d+%.2f", 1, 234.567), L"1+234.57"},
       {format(L"[%5s|%c|%hs]", L"abc", L'x', "nar"), L"[  abc|x|nar]"},
       {format(L"%d%% %ld %#x %.2e", 100, -7L, 31U, 5.3), L"100% -7 0x1f 5.30e+00"},
       {format(L"%2$s=%1$d", 7, L"k"), L"k=7"},
@@ -156,12 +137,8 @@ TEST(SvyStringOperators, ConcatenateAndCompare) {
   CSvyString text = CSvyString(L"1") + L"+" + CSvyString("234", svy_text::kCodePageUtf8) + L'.';
   text += L"5";
   EXPECT_TRUE(text == L"1+234.5");
-  EXPECT_TRUE(text != CSvyString(L"1+234.50"));
-  EXPECT_TRUE(CSvyString(L"a") < CSvyString(L"b"));
   text = static_cast<const wchar_t*>(nullptr);
   EXPECT_TRUE(text.IsEmpty());
-  EXPECT_EQ(CSvyString(L'-', 3).str(), L"---");
-  EXPECT_EQ(CSvyString(L"abcdef", 3).str(), L"abc");
 }
 
 }  // namespace
