@@ -19,8 +19,8 @@ constexpr double kNorthOrigin = 5000000.0;
 constexpr double kEastOrigin = 500000.0;
 
 // Points on a circle arc, with Gaussian noise of sigma (metres) on the radius.
-svy_list<C2dPos> arcPoints(const C2dPos& centre, double radius, double fromRad, double toRad, int count,
-                           double sigma, unsigned seed) {
+svy_list<C2dPos> arcPoints(const C2dPos& centre, double radius, double fromRad, double toRad, int count, double sigma,
+                           unsigned seed) {
   std::mt19937 rng(seed);
   std::normal_distribution<double> noise(0.0, sigma);
   svy_list<C2dPos> points;
@@ -82,7 +82,8 @@ TEST(BestFitCircle, RecoversCentreAndRadiusAtSurveyCoordinates) {
     double fromDeg, toDeg;
     int count;
     double sigma, tolerance;  // metres
-  } cases[] = {{0, 350, 36, 0.0, 1e-6}, {10, 25, 8, 0.0, 1e-6}, {0, 359, 200, 0.002, 0.001}, {30, 120, 100, 0.002, 0.01}};
+  } cases[] = {
+      {0, 350, 36, 0.0, 1e-6}, {10, 25, 8, 0.0, 1e-6}, {0, 359, 200, 0.002, 0.001}, {30, 120, 100, 0.002, 0.01}};
   const C2dPos centre(kNorthOrigin + 123.456, kEastOrigin + 789.012);
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c.fromDeg << ".." << c.toDeg << " sigma " << c.sigma);
@@ -158,7 +159,8 @@ TEST(BestFitRadius, ConvergesAfterOneZeroCorrection) {
   ASSERT_EQ(svy_math::gaussNewtonLeastSquares(solution, data), svy_math::eLsqOk);
   EXPECT_EQ(data.evaluations, 1);
   double meanDistance = 0.0;
-  for (const C2dPos& p : points) meanDistance += std::hypot(p.north() - centre.north(), p.east() - centre.east()) / 25.0;
+  for (const C2dPos& p : points)
+    meanDistance += std::hypot(p.north() - centre.north(), p.east() - centre.east()) / 25.0;
   EXPECT_NEAR(solution[0], meanDistance, 1e-9);
   EXPECT_NEAR(solution[0], 80.0, 0.003);
 
@@ -181,8 +183,9 @@ TEST(BestFitRadius, ConvergesAfterOneZeroCorrection) {
 
 // Grades of an RMS: the bounds are exclusive; NaN is the worst grade. Undefined markers of a triad.
 TEST(FitQuality, RmsGradesAndUndefinedTriads) {
-  const double cases[][2] = {{1e9, 9}, {200.0001, 9}, {200.0, 8}, {10.0, 7},       {5.0, 6},  {1.0, 5},  {0.5, 4},
-                             {0.1, 3}, {0.05, 2},     {0.0100001, 2}, {0.01, 1}, {0.0, 1}, {-3.0, 1}, {std::nan(""), 9}};
+  const double cases[][2] = {{1e9, 9},  {200.0001, 9}, {200.0, 8}, {10.0, 7},        {5.0, 6},
+                             {1.0, 5},  {0.5, 4},      {0.1, 3},   {0.05, 2},        {0.0100001, 2},
+                             {0.01, 1}, {0.0, 1},      {-3.0, 1},  {std::nan(""), 9}};
   for (const auto& c : cases) EXPECT_EQ(svy_math::RmsToKnown(c[0]), static_cast<int>(c[1])) << c[0];
   const svy_math::DefTriad undefined, partial(1.0, svy_math::undefinedValue(), 3.0);
   EXPECT_TRUE(undefined.IsUndef() && !undefined.IsPartialUndef());

@@ -54,15 +54,6 @@ TEST(TCoordCov, GeocentricTopocentricAxesAndRoundTrip) {
     }
 }
 
-TCoords coords(double north, double east, double height, unsigned mask = TCoords::kAllValid) {
-  TCoords p;
-  p.north = north;
-  p.east = east;
-  p.height = height;
-  p.mask = mask;
-  return p;
-}
-
 // Uncorrelated: weights by inverse variance per component (b has a quarter of a's variance in north and
 // east, the same in height). Correlated: the generalised least-squares mean, W_a = [[4/3, -2/3], [-2/3, 4/3]],
 // W_b = I, mean = (W_a + I)^-1 (W_a a + b) = (157/15, 302/15): the east moves although both east values agree.
@@ -70,8 +61,10 @@ TCoords coords(double north, double east, double height, unsigned mask = TCoords
 TEST(CWaCoords, WeightedAverageAndRefusals) {
   CWaCoords average;
   TCoords mean;
-  ASSERT_TRUE(average.add(coords(5000000.010, 500000.020, 100.0), TCoordCov(4e-6, 4e-6, 1e-4, 0, 0, 0)));
-  ASSERT_TRUE(average.add(coords(5000000.010 + 0.030, 500000.020 - 0.060, 100.5), TCoordCov(1e-6, 1e-6, 1e-4, 0, 0, 0)));
+  ASSERT_TRUE(
+      average.add(TCoords{5000000.010, 500000.020, 100.0, TCoords::kAllValid}, TCoordCov(4e-6, 4e-6, 1e-4, 0, 0, 0)));
+  ASSERT_TRUE(average.add(TCoords{5000000.010 + 0.030, 500000.020 - 0.060, 100.5, TCoords::kAllValid},
+                          TCoordCov(1e-6, 1e-6, 1e-4, 0, 0, 0)));
   ASSERT_TRUE(average.getResult(mean));
   EXPECT_NEAR(mean.north - 5000000.010, 0.8 * 0.030, 1e-9);
   EXPECT_NEAR(mean.east - 500000.020, -0.8 * 0.060, 1e-9);
@@ -80,8 +73,8 @@ TEST(CWaCoords, WeightedAverageAndRefusals) {
 
   const unsigned horizontal = TCoords::kNorthValid | TCoords::kEastValid;
   CWaCoords correlated;
-  ASSERT_TRUE(correlated.add(coords(10.0, 20.0, 0.0, horizontal), TCoordCov(1.0, 1.0, 0.0, 0.5, 0.0, 0.0)));
-  ASSERT_TRUE(correlated.add(coords(11.0, 20.0, 0.0, horizontal), TCoordCov(1.0, 1.0, 0.0, 0.0, 0.0, 0.0)));
+  ASSERT_TRUE(correlated.add(TCoords{10.0, 20.0, 0.0, horizontal}, TCoordCov(1.0, 1.0, 0.0, 0.5, 0.0, 0.0)));
+  ASSERT_TRUE(correlated.add(TCoords{11.0, 20.0, 0.0, horizontal}, TCoordCov(1.0, 1.0, 0.0, 0.0, 0.0, 0.0)));
   mean.height = -7.0;
   ASSERT_TRUE(correlated.getResult(mean));
   EXPECT_NEAR(mean.north, 157.0 / 15.0, 1e-12);
@@ -93,8 +86,8 @@ TEST(CWaCoords, WeightedAverageAndRefusals) {
   EXPECT_FALSE(empty.getResult(mean));
   EXPECT_FALSE(empty.add(TCoords(), TCoordCov()));
   EXPECT_FALSE(empty.add(TCoords(), TCoordCov(1, -1, 1, 0, 0, 0)));
-  EXPECT_FALSE(empty.add(coords(std::nan(""), 0, 0), TCoordCov(1, 1, 1, 0, 0, 0)));
-  EXPECT_FALSE(empty.add(coords(std::nan(""), 0, 0, 0), TCoordCov(1, 1, 1, 0, 0, 0)));
+  EXPECT_FALSE(empty.add(TCoords{std::nan(""), 0, 0, TCoords::kAllValid}, TCoordCov(1, 1, 1, 0, 0, 0)));
+  EXPECT_FALSE(empty.add(TCoords{std::nan(""), 0, 0, 0}, TCoordCov(1, 1, 1, 0, 0, 0)));
   EXPECT_EQ(empty.count(), 0);
 }
 

@@ -35,9 +35,9 @@ TEST(Matr3Inverse, InverseTimesOriginalIsIdentityOrZeroWhenSingular) {
     adj_test::expectIdentity(inverse * c.m, c.tolerance);
     for (int k = 0; k < 9; ++k) EXPECT_NEAR(back.m[k], c.m.m[k], c.tolerance * (1.0 + std::fabs(c.m.m[k])));
   }
-  for (const matr3_3& m : {matr3_3(), matr3_3(1, 2, 3, 2, 4, 6, 0, 1, 5), matr3_3(1, 2, 3, 4, 5, 6, 7, 8, 9),
-                           matr3_3(1e-5, 0, 0, 0, 1e-5, 0, 0, 0, 5e-3),
-                           matr3_3(4e-6, 1e-6, 0.0, 1e-6, 9e-6, 2e-6, 0.0, 2e-6, 1e-5)})
+  for (const matr3_3& m :
+       {matr3_3(), matr3_3(1, 2, 3, 2, 4, 6, 0, 1, 5), matr3_3(1, 2, 3, 4, 5, 6, 7, 8, 9),
+        matr3_3(1e-5, 0, 0, 0, 1e-5, 0, 0, 0, 5e-3), matr3_3(4e-6, 1e-6, 0.0, 1e-6, 9e-6, 2e-6, 0.0, 2e-6, 1e-5)})
     for (double element : matr3_3(m, matr3_3::kInverse).m) EXPECT_EQ(element, 0.0) << m.det();
 }
 

@@ -40,11 +40,14 @@ TEST(LeastSquares, ReportsShapeRankAndFiniteProblemsWithAnEmptySolution) {
     TLsqMatrix a, y, w;
     ELeastSquaresStatus expected;
   } cases[] = {
-      {"one point two unknowns", matrix(1, 2, {1, 1}), matrix(1, 1, {3}), identity(1), svy_math::eLsqTooFewObservations},
-      {"rows differ", matrix(2, 2, {1, 1, 2, 1}), matrix(3, 1, {1, 2, 3}), identity(2), svy_math::eLsqDimensionMismatch},
+      {"one point two unknowns", matrix(1, 2, {1, 1}), matrix(1, 1, {3}), identity(1),
+       svy_math::eLsqTooFewObservations},
+      {"rows differ", matrix(2, 2, {1, 1, 2, 1}), matrix(3, 1, {1, 2, 3}), identity(2),
+       svy_math::eLsqDimensionMismatch},
       {"two observation columns", matrix(2, 1, {1, 1}), matrix(2, 2, {1, 2, 3, 4}), identity(2),
        svy_math::eLsqDimensionMismatch},
-      {"weights of another size", matrix(2, 1, {1, 1}), matrix(2, 1, {1, 2}), identity(3), svy_math::eLsqDimensionMismatch},
+      {"weights of another size", matrix(2, 1, {1, 1}), matrix(2, 1, {1, 2}), identity(3),
+       svy_math::eLsqDimensionMismatch},
       {"equal columns", matrix(3, 2, {1, 1, 2, 2, 3, 3}), matrix(3, 1, {1, 2, 4}), identity(3), svy_math::eLsqSingular},
       {"zero weights", matrix(2, 1, {1, 1}), matrix(2, 1, {1, 2}), TLsqMatrix(2, 2, 0.0), svy_math::eLsqSingular},
       {"NaN in design", matrix(2, 1, {1, std::nan("")}), matrix(2, 1, {1, 2}), identity(2), svy_math::eLsqNotFinite},
@@ -61,8 +64,9 @@ TEST(LeastSquares, ReportsShapeRankAndFiniteProblemsWithAnEmptySolution) {
 // weights give the generating unknowns; repeated measurements with weights 1/sigma^2 give the weighted mean.
 TEST(LeastSquares, SolvesExactConsistentAndWeightedProblems) {
   svy_vector<double> solution;
-  ASSERT_EQ(svy_math::leastSquares(solution, TMatrixData(matrix(2, 2, {1, 1, 2, 1}), matrix(2, 1, {3, 5}), identity(2))),
-            svy_math::eLsqOk);
+  ASSERT_EQ(
+      svy_math::leastSquares(solution, TMatrixData(matrix(2, 2, {1, 1, 2, 1}), matrix(2, 1, {3, 5}), identity(2))),
+      svy_math::eLsqOk);
   ASSERT_EQ(solution.size(), 2U);
   EXPECT_NEAR(solution[0], 2.0, 1e-15);
   EXPECT_NEAR(solution[1], 1.0, 1e-15);
@@ -96,7 +100,10 @@ class TScalarProblem : public svy_math::TNonLinearLeastSquaresData {
   }
   TLsqMatrix getAMatrix() const override { return TLsqMatrix(1, 1, kind_ == Kind::kSqrtTwo ? 2.0 * x() : 1.0); }
   TLsqMatrix getYMatrix() const override {
-    return TLsqMatrix(1, 1, kind_ == Kind::kSqrtTwo ? 2.0 - x() * x() : kind_ == Kind::kNeverSettles ? 1.0 : x() * 1e200);
+    return TLsqMatrix(1, 1,
+                      kind_ == Kind::kSqrtTwo        ? 2.0 - x() * x()
+                      : kind_ == Kind::kNeverSettles ? 1.0
+                                                     : x() * 1e200);
   }
   TLsqMatrix getWeightMatrix() const override { return TLsqMatrix(1, 1, 1.0); }
 

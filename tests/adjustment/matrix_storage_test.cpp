@@ -24,7 +24,8 @@ TEST(Loc1, GivesStoragePosition) {
   for (const auto& c : cases) EXPECT_EQ(LOC1(c[0], c[1], c[2], 0, c[3]), c[4]) << c[0] << c[1] << c[2] << " " << c[3];
   int expected = 1;
   for (int i = 1; i <= 6; ++i)
-    for (int j = 1; j <= i; ++j, ++expected) EXPECT_TRUE(LOC1(i, j, 6, 6, 1) == expected && LOC1(j, i, 6, 6, 1) == expected);
+    for (int j = 1; j <= i; ++j, ++expected)
+      EXPECT_TRUE(LOC1(i, j, 6, 6, 1) == expected && LOC1(j, i, 6, 6, 1) == expected);
 }
 
 TEST(MatrixStorage, ZeroedColumnMajorCopiesBlocks) {

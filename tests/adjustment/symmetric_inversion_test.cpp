@@ -38,8 +38,11 @@ TEST(CanInvert, FactorOfPositiveDefiniteAndRefusals) {
     TSMatrix s;
     double bound;
     int expected;
-  } cases[] = {{symmetric2(1, 2, 1), 1e6, 0},       {symmetric2(1, 1, 1), 1e6, 0},   {symmetric2(1, 0, 1e-4), 100, 1},
-               {symmetric2(1, 0, 1e-4), 99, 0},      {symmetric2(std::nan(""), 0, 1), 1e6, 0}};
+  } cases[] = {{symmetric2(1, 2, 1), 1e6, 0},
+               {symmetric2(1, 1, 1), 1e6, 0},
+               {symmetric2(1, 0, 1e-4), 100, 1},
+               {symmetric2(1, 0, 1e-4), 99, 0},
+               {symmetric2(std::nan(""), 0, 1), 1e6, 0}};
   for (const auto& c : cases) {
     TSMatrix copy(c.s);
     EXPECT_EQ(svy_math::CanInvert(copy, c.bound), c.expected) << c.s(2, 1) << " " << c.s(2, 2) << " " << c.bound;
@@ -52,12 +55,10 @@ TEST(InvertSMatr3, StatusAndInverse) {
   const struct {
     svy_math::covar c;
     int expected;
-  } cases[] = {{svy_math::covar(4, 1, 5, 2, 3, 6), 0},
-               {svy_math::covar(4e-6, 1e-6, 9e-6, 0.0, 2e-6, 1e-5), 0},
+  } cases[] = {{svy_math::covar(4, 1, 5, 2, 3, 6), 0},    {svy_math::covar(4e-6, 1e-6, 9e-6, 0.0, 2e-6, 1e-5), 0},
                {svy_math::covar(1, 2, 1, 0, 0, 1), -2},    // indefinite: det < 0
                {svy_math::covar(-1, 0, -1, 0, 0, 1), -2},  // det > 0, diagonal negative
-               {svy_math::covar(1, 1, 1, 1, 1, 1), -1},
-               {svy_math::covar(), -1}};
+               {svy_math::covar(1, 1, 1, 1, 1, 1), -1},   {svy_math::covar(), -1}};
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c.c.c[0] << " " << c.c.c[1] << " " << c.c.c[2]);
     svy_math::covar inverse(c.c);

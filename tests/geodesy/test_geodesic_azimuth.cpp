@@ -56,15 +56,17 @@ TEST(GeodesicAzimuth, MatchesIndependentInverse) {
 // positions (radians) give none and leave the angle as it was.
 TEST(GeodesicAzimuth, CardinalDirectionsAndNoDirection) {
   const double any = std::numeric_limits<double>::quiet_NaN(), inf = std::numeric_limits<double>::infinity();
-  const double cardinal[][5] = {{10, 20, 50, 20, 0},    {50, -120, -10, -120, 180}, {0, 10, 0, 40, 90},
-                                {0, 10, 0, -20, -90},   {0, 179, 0, -179, 90},      {-45, -179.5, -40, -179.5, 0},
-                                {-90, 0, 10, 0, 0},     {0, 0, 0, 180, any},        {30, 0, -30, 180, any}};
+  const double cardinal[][5] = {{10, 20, 50, 20, 0},  {50, -120, -10, -120, 180}, {0, 10, 0, 40, 90},
+                                {0, 10, 0, -20, -90}, {0, 179, 0, -179, 90},      {-45, -179.5, -40, -179.5, 0},
+                                {-90, 0, 10, 0, 0},   {0, 0, 0, 180, any},        {30, 0, -30, 180, any}};
   for (const auto& c : cardinal) {
     SCOPED_TRACE(::testing::Message() << c[0] << " " << c[1] << " -> " << c[2] << " " << c[3]);
     CMathAngle az;
     ASSERT_TRUE(setAzimuthDeg(az, c[0], c[1], c[2], c[3]));
-    if (std::isnan(c[4])) EXPECT_LE(std::fabs(az.getRad()), kPi);
-    else EXPECT_NEAR(az.getRad(), c[4] * kDegToRad, 1e-12);
+    if (std::isnan(c[4]))
+      EXPECT_LE(std::fabs(az.getRad()), kPi);
+    else
+      EXPECT_NEAR(az.getRad(), c[4] * kDegToRad, 1e-12);
   }
   const double none[][4] = {{0.5, 0.3, 0.5, 0.3}, {0.5, 0.3, 0.5, 0.3 + kTwoPi}, {any, 0.0, 0.1, 0.1},
                             {0.1, 0.1, 0.2, inf}, {1.6, 0.0, 0.0, 0.0},          {0.0, 0.0, -2.0, 0.0}};
@@ -87,8 +89,9 @@ TEST(GeocentricAngle, MatchesHaversineAndEdgeCases) {
   std::uniform_real_distribution<double> lat(-90.0, 90.0), lon(-180.0, 180.0), radius(1.0, 2.0e7);
   for (int i = 0; i < 2000; ++i) {
     const double lat1 = lat(engine), lon1 = lon(engine), lat2 = lat(engine), lon2 = lon(engine);
-    const double h = std::pow(std::sin((lat2 - lat1) * kDegToRad / 2), 2) +
-                     std::cos(lat1 * kDegToRad) * std::cos(lat2 * kDegToRad) * std::pow(std::sin((lon2 - lon1) * kDegToRad / 2), 2);
+    const double h =
+        std::pow(std::sin((lat2 - lat1) * kDegToRad / 2), 2) +
+        std::cos(lat1 * kDegToRad) * std::cos(lat2 * kDegToRad) * std::pow(std::sin((lon2 - lon1) * kDegToRad / 2), 2);
     const double expected = 2.0 * std::asin(std::min(1.0, std::sqrt(h)));
     const Coord a = onSphere(lat1, lon1, radius(engine)), b = onSphere(lat2, lon2, radius(engine));
     ASSERT_NEAR(rotRange(a, b), expected, 1e-12);
@@ -98,7 +101,8 @@ TEST(GeocentricAngle, MatchesHaversineAndEdgeCases) {
   EXPECT_EQ(rotRange(p, p), 0.0);
   EXPECT_NEAR(rotRange(p, Coord(-p.x(), -p.y(), -p.z())), kPi, 1e-15);
   EXPECT_NEAR(rotRange(onSphere(0.0, 0.0, 1.0), onSphere(0.0, 1e-9, 5.0)), 1e-9 * kDegToRad, 1e-22);
-  for (const auto& pair : {std::make_pair(p, zero), std::make_pair(zero, p), std::make_pair(p, Coord(std::nan(""), 0, 1))})
+  for (const auto& pair :
+       {std::make_pair(p, zero), std::make_pair(zero, p), std::make_pair(p, Coord(std::nan(""), 0, 1))})
     EXPECT_TRUE(std::isnan(rotRange(pair.first, pair.second)));
 }
 

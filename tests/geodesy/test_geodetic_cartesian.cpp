@@ -63,18 +63,19 @@ TEST(GeodeticCartesian, MatchesIndependentLibraryOverGlobalGrid) {
 // table stays in the shared reference folder, so this runs only where that folder is present.
 TEST(GeodeticCartesian, MatchesReferenceTableForTheStoredEccentricity) {
   SVY_SKIP_WITHOUT_REFDATA();
-  const svy_test::CsvTable t = svy_test::readCsvTable(svy_test::refdataPath("geodetic/geodetic_ecef_cartconvert.csv"));
-  ASSERT_EQ(t.rows.size(), 516u);
-  const auto at = [&t](const std::vector<double>& row, const char* x, const char* y, const char* z) {
-    return Coord(row[t.column(x)], row[t.column(y)], row[t.column(z)]);
-  };
+  const svy_test::CsvColumns t =
+      svy_test::readCsvColumns(svy_test::refdataPath("geodetic/geodetic_ecef_cartconvert.csv"));
+  ASSERT_EQ(t.at("lat_deg").size(), 516u);
   double largestEllipsoidDifference = 0.0;
-  for (const auto& row : t.rows) {
-    const Coord expected = at(row, "X_e0818191913305", "Y_e0818191913305", "Z_e0818191913305");
-    const Coord c = toCartesian(row[t.column("lat_deg")], row[t.column("lon_deg")], row[t.column("h_m")]);
-    ASSERT_LT(distance(c, expected), kForwardTol) << row[0] << " " << row[1] << " " << row[2];
+  for (std::size_t r = 0; r < 516; ++r) {
+    const auto at = [&t, r](const std::string& x) {
+      return Coord(t.at("X_" + x)[r], t.at("Y_" + x)[r], t.at("Z_" + x)[r]);
+    };
+    const Coord expected = at("e0818191913305"),
+                c = toCartesian(t.at("lat_deg")[r], t.at("lon_deg")[r], t.at("h_m")[r]);
+    ASSERT_LT(distance(c, expected), kForwardTol) << t.at("lat_deg")[r] << " " << t.at("lon_deg")[r];
     ASSERT_LT(distance(toCartesian(0, 0, 0).blh2xyz(toGeodetic(expected)), expected), kReverseTol);
-    largestEllipsoidDifference = std::max(largestEllipsoidDifference, distance(c, at(row, "X_wgs84", "Y_wgs84", "Z_wgs84")));
+    largestEllipsoidDifference = std::max(largestEllipsoidDifference, distance(c, at("wgs84")));
   }
   EXPECT_GT(largestEllipsoidDifference, 1e-4);
   EXPECT_LT(largestEllipsoidDifference, 5e-4);

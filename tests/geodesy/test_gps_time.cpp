@@ -56,14 +56,16 @@ TEST(GpsTimeCalendar, EveryDayOfTheValidRangeMatchesIndependentDayCount) {
         int dayOfYear = 0;
         mday_to_yday(year, month, day, &dayOfYear);
         ASSERT_EQ(dayOfYear, monthStart + day - daysFromCivil(year, 1, 1));
-        for (const double timeOfDay : {kFixed[dayIndex % 8], std::fmod(static_cast<double>(dayIndex) * 7919.37, 86400.0)}) {
+        for (const double timeOfDay :
+             {kFixed[dayIndex % 8], std::fmod(static_cast<double>(dayIndex) * 7919.37, 86400.0)}) {
           const int hour = static_cast<int>(timeOfDay / 3600.0);
           const int minute = static_cast<int>((timeOfDay - hour * 3600.0) / 60.0);
           const double second = timeOfDay - hour * 3600.0 - minute * 60.0;
           int week = 0, weekByDay = 0;
           double secondsOfWeek = 0.0, secondsByDay = 0.0;
           ymdhms_to_gps(year, month, day, hour, minute, second, &week, &secondsOfWeek);
-          ASSERT_NEAR(week * kSecondsPerWeek + secondsOfWeek, static_cast<double>(days) * 86400.0 + timeOfDay, kSecondTol);
+          ASSERT_NEAR(week * kSecondsPerWeek + secondsOfWeek, static_cast<double>(days) * 86400.0 + timeOfDay,
+                      kSecondTol);
           ASSERT_TRUE(days >= 0 ? secondsOfWeek >= 0.0 && secondsOfWeek < kSecondsPerWeek
                                 : week <= 0 && secondsOfWeek > -kSecondsPerWeek)
               << week << " " << secondsOfWeek;
@@ -92,32 +94,33 @@ TEST(GpsTimeCalendar, EveryDayOfTheValidRangeMatchesIndependentDayCount) {
 // Generated calendar/GPS pairs: the epoch, week ends, both week-number rollovers, day 366, the end of the
 // valid range, fractional seconds and published anchors (1999-01-01 is week 990, 432000 s).
 TEST(GpsTimeCalendar, MatchesGeneratedVectors) {
-  const svy_test::CsvTable table = svy_test::readCsvTable(svy_test::testdataPath("geodesy/gps_week_sow_vectors.csv"));
-  ASSERT_EQ(table.rows.size(), 70u);
-  for (const auto& row : table.rows) {
-    const auto field = [&](const char* name) { return static_cast<int>(row.at(table.column(name))); };
-    const double second = row[table.column("second")], expectedSeconds = row[table.column("seconds_of_week")];
+  const svy_test::CsvColumns t = svy_test::readCsvColumns(svy_test::testdataPath("geodesy/gps_week_sow_vectors.csv"));
+  ASSERT_EQ(t.at("year").size(), 70u);
+  for (std::size_t r = 0; r < 70; ++r) {
+    const auto field = [&t, r](const char* name) { return static_cast<int>(t.at(name)[r]); };
+    const double second = t.at("second")[r], expectedSeconds = t.at("seconds_of_week")[r];
     int week = 0;
     double secondsOfWeek = 0.0;
     ymdhms_to_gps(field("year"), field("month"), field("day"), field("hour"), field("minute"), second, &week,
                   &secondsOfWeek);
-    EXPECT_NEAR(week * kSecondsPerWeek + secondsOfWeek, row[table.column("seconds_since_gps_epoch")], kSecondTol);
+    EXPECT_NEAR(week * kSecondsPerWeek + secondsOfWeek, t.at("seconds_since_gps_epoch")[r], kSecondTol);
     if (field("gps_week") >= 0) {
       EXPECT_EQ(week, field("gps_week"));
       EXPECT_NEAR(secondsOfWeek, expectedSeconds, kSecondTol);
     }
-    const CalendarTime t = fromGps(field("gps_week"), expectedSeconds);
-    EXPECT_TRUE(t.year == field("year") && t.month == field("month") && t.day == field("day") &&
-                t.dayOfYear == field("day_of_year") && t.hour == field("hour") && t.minute == field("minute"))
+    const CalendarTime back = fromGps(field("gps_week"), expectedSeconds);
+    EXPECT_TRUE(back.year == field("year") && back.month == field("month") && back.day == field("day") &&
+                back.dayOfYear == field("day_of_year") && back.hour == field("hour") && back.minute == field("minute"))
         << field("year") << "-" << field("month") << "-" << field("day") << " " << field("hour");
-    EXPECT_NEAR(t.second, second, kSecondTol);
+    EXPECT_NEAR(back.second, second, kSecondTol);
   }
 }
 
 // Inputs that cannot name a day give undefined results (NaN seconds, zero fields), never a table read
 // out of bounds, an integer overflow or a hang.
 TEST(GpsTimeCalendar, InputsThatNameNoDayGiveUndefinedResults) {
-  const int calendarCases[][3] = {{2020, 0, 1}, {2020, 13, 1}, {2020, -5, 1}, {2020, INT_MAX, 1}, {INT_MAX, 12, 31}, {INT_MIN, 12, 31}};
+  const int calendarCases[][3] = {{2020, 0, 1},       {2020, 13, 1},     {2020, -5, 1},
+                                  {2020, INT_MAX, 1}, {INT_MAX, 12, 31}, {INT_MIN, 12, 31}};
   for (const auto& c : calendarCases) {
     int week = 7, dayOfYear = -1;
     double secondsOfWeek = 0.0;
@@ -138,7 +141,8 @@ TEST(GpsTimeCalendar, InputsThatNameNoDayGiveUndefinedResults) {
   } gpsCases[] = {{0, std::nan("")}, {0, inf}, {0, -inf}, {INT_MIN, 0.0}, {INT_MAX, 1e300}, {-4123, 0.0}};
   for (const auto& c : gpsCases) {
     const CalendarTime t = fromGps(c.week, c.secondsOfWeek);
-    EXPECT_TRUE(t.year == 0 && t.month == 0 && t.dayOfYear == 0 && std::isnan(t.second)) << c.week << " " << c.secondsOfWeek;
+    EXPECT_TRUE(t.year == 0 && t.month == 0 && t.dayOfYear == 0 && std::isnan(t.second))
+        << c.week << " " << c.secondsOfWeek;
   }
 }
 

@@ -22,9 +22,9 @@ using svy_math::units::kTwoPi;
 TEST(LocalFrame, MatchesIndependentLocalCartesian) {
   const svy_math::TEllipsoidParams& ell = svy_math::ellipsoidParams();
   const GeographicLib::Geocentric earth(ell.a, 1.0 - std::sqrt(1.0 - ell.e2));
-  const double origins[][3] = {{0.0, 0.0, 0.0},    {53.8, 2.13, 73.0},         {-33.9, 151.2, 40.0},
-                               {90.0, 0.0, 0.0},   {-90.0, 30.0, 100.0},       {12.5, 180.0, 0.0},
-                               {-45.0, -179.9999999, 10.0}, {89.9999999, -75.0, 3000.0}};
+  const double origins[][3] = {
+      {0.0, 0.0, 0.0},      {53.8, 2.13, 73.0}, {-33.9, 151.2, 40.0},        {90.0, 0.0, 0.0},
+      {-90.0, 30.0, 100.0}, {12.5, 180.0, 0.0}, {-45.0, -179.9999999, 10.0}, {89.9999999, -75.0, 3000.0}};
   for (const auto& o : origins) {
     const GeographicLib::LocalCartesian frame(o[0], o[1], o[2], earth);
     Coord origin;
@@ -48,13 +48,14 @@ TEST(LocalFrame, MatchesIndependentLocalCartesian) {
 // it. A vector without direction (horizontal length squared and up both inside +-1e-12, so anything up to
 // 1e-6 m across with no height) gives the largest double for both angles and a zero distance.
 TEST(LocalPolar, RecoversAzimuthElevationAndDistance) {
-  const double cases[][3] = {{0.0, 0.0, 100.0},  {90.0, 10.0, 25.0},   {180.0, -5.0, 1000.0},
-                             {270.0, 45.0, 3.5}, {-0.5, 1.0, 2.0e7},   {359.9999, -89.0, 0.01},
-                             {0.0, 90.0, 12.0},  {0.0, -90.0, 12.0},   {123.456, 0.0, 1e-5}};
+  const double cases[][3] = {{0.0, 0.0, 100.0},  {90.0, 10.0, 25.0}, {180.0, -5.0, 1000.0},
+                             {270.0, 45.0, 3.5}, {-0.5, 1.0, 2.0e7}, {359.9999, -89.0, 0.01},
+                             {0.0, 90.0, 12.0},  {0.0, -90.0, 12.0}, {123.456, 0.0, 1e-5}};
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c[0] << " " << c[1] << " " << c[2]);
     const double az = c[0] * kDegToRad, el = c[1] * kDegToRad;
-    const Vec3 polar = neu_to_polar(Vec3(c[2] * std::cos(el) * std::sin(az), c[2] * std::cos(el) * std::cos(az), c[2] * std::sin(el)));
+    const Vec3 polar =
+        neu_to_polar(Vec3(c[2] * std::cos(el) * std::sin(az), c[2] * std::cos(el) * std::cos(az), c[2] * std::sin(el)));
     EXPECT_NEAR(polar[0], el, 1e-14);
     if (std::fabs(c[1]) < 90.0) {
       EXPECT_NEAR(polar[1], std::fmod(az + kTwoPi, kTwoPi), 1e-14);
