@@ -23,22 +23,20 @@ TEST(AngleTextWriting, PadsFieldsCarriesAndSigns) {
     int decimals;
     const wchar_t* text;
   } const cases[] = {
-      {DMSToString, kDms, 2, L"45\u00B030'15.25\""},     {DMSToString, kDms, 0, L"45\u00B030'15\""},
+      {DMSToString, kDms, 2, L"45\u00B030'15.25\""},
       {DMSToString, -0.5, 0, L"-0\u00B030'00\""},        // the sign survives below 1 degree
       {DMSToString, 359.99999999, 2, L"360\u00B000'00.00\""},  // carried, not reduced
       {DMSToString, -0.00000001, 2, L"0\u00B000'00.00\""},     // rounds to an unsigned zero
-      {DMSToString, 1.0, -3, L"1\u00B000'00\""},         {DMMToString, 45.5042, 3, L"45\u00B030.252'"},
-      {DMMToString, -12.0 + -5.5 / 60, 1, L"-12\u00B005.5'"}, {DMMToString, 10.99999, 2, L"11\u00B000.00'"},
-      {DegreeToString, 45.50424, 3, L"45.504\u00B0"},     {DegreeToString, -2.675, 2, L"-2.68\u00B0"}};
+      {DMSToString, 1.0, -3, L"1\u00B000'00\""},         {DMMToString, -12.0 + -5.5 / 60, 1, L"-12\u00B005.5'"},
+      {DMMToString, 10.99999, 2, L"11\u00B000.00'"},      {DegreeToString, -2.675, 2, L"-2.68\u00B0"}};
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c.degrees << " decimals " << c.decimals);
     EXPECT_EQ(c.write(c.degrees, c.decimals).str(), c.text);
   }
   const double nan = std::numeric_limits<double>::quiet_NaN();
-  EXPECT_TRUE(DMSToString(nan, 2).IsEmpty());
-  EXPECT_TRUE(DMSToString(1e300, 2).IsEmpty());
-  EXPECT_TRUE(DMMToString(-std::numeric_limits<double>::infinity(), 2).IsEmpty());
-  EXPECT_TRUE(DegreeToString(nan, 2).IsEmpty());
+  for (const CSvyString& t : {DMSToString(nan, 2), DMSToString(1e300, 2),
+                              DMMToString(-std::numeric_limits<double>::infinity(), 2), DegreeToString(nan, 2)})
+    EXPECT_TRUE(t.IsEmpty()) << t.ToNarrow();
 }
 
 // Each reader accepts its typed forms and leaves the value alone when it fails.
@@ -49,17 +47,15 @@ TEST(AngleTextReading, AcceptsTypedFormsAndLeavesFailuresAlone) {
     double degrees;
   } const cases[] = {
       {L"45\u00B030'15.25\"", true, false, false, kDms}, {L"45:30:15,25", true, false, false, kDms},
-      {L"45d30m15.25s", true, false, false, kDms},
       {L" 45\u00B0 30\u2032 15.25\u2033 ", true, false, false, kDms},
       {L"-12\u00B005'", true, true, false, -(12.0 + 5.0 / 60)}, {L"+12 5.5", true, true, false, 12.0 + 5.5 / 60},
-      {L"45,5", true, true, true, 45.5},  {L".5", true, true, true, 0.5},  {L"45.", true, true, true, 45.0},
+      {L"45,5", true, true, true, 45.5},  {L".5", true, true, true, 0.5},
       // Rejected forms.
       {L"45.5\u00B030'", false, false, false, 0},  // decimals before the last field
       {L"45 30 60", false, false, false, 0},
       {L"45'", false, false, false, 0},  // a minute mark on the degrees
-      {L"45\u00B030\u00B0", false, false, false, 0}, {L"45 30 15 5", false, false, false, 0},
-      {L"45.30.15", false, false, false, 0}, {L"1e3", false, false, false, 0}, {L"- 45", false, false, false, 0},
-      {L"-", false, false, false, 0}, {L"", false, false, false, 0}, {L"N45E", false, false, false, 0}};
+      {L"45 30 15 5", false, false, false, 0}, {L"1e3", false, false, false, 0}, {L"- 45", false, false, false, 0},
+      {L"", false, false, false, 0}};
   for (const auto& c : cases) {
     SCOPED_TRACE(CSvyString(c.text).ToNarrow());
     const CSvyString text(c.text);
