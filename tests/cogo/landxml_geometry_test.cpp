@@ -67,9 +67,8 @@ std::vector<Element> collect(const std::string& tag) {
   std::vector<Element> out;
   const std::filesystem::path root = svy_test::refdataPath("alignment/ifc-infra-unit-test");
   for (const auto& entry : std::filesystem::recursive_directory_iterator(root)) {
-    std::string ext = entry.path().extension().string();
-    for (char& ch : ext) ch = static_cast<char>(std::tolower(static_cast<unsigned char>(ch)));
-    if (ext != ".xml") continue;
+    const std::string ext = entry.path().extension().string();
+    if (ext != ".xml" && ext != ".XML") continue;
     std::ifstream in(entry.path(), std::ios::binary);
     const std::string text{std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
     std::size_t at = 0;
@@ -105,15 +104,14 @@ TEST(LandXmlLines, InverseGivesThePublishedDirectionAndLength) {
       EXPECT_NEAR(std::remainder(azimuth - published, 2 * kPi), 0.0, kPublishedPos / distance + 1e-9);
       double e = 0, n = 0;
       Radiate2D(start.east(), start.north(), published, attribute(line.head, "length"), e, n);
-      EXPECT_NEAR(n, end.north(), kPublishedPos);
-      EXPECT_NEAR(e, end.east(), kPublishedPos);
+      EXPECT_NEAR(std::hypot(n - end.north(), e - end.east()), 0.0, kPublishedPos);
     }
   }
 }
 
-// Every arc's centre is the crossing of the circles about its ends on the side its turn says; the radial
-// line through the start meets the circle at the start and opposite it; the start tangent touches.
-TEST(LandXmlArcs, CentreRadialLineAndStartTangentAgreeWithTheCircle) {
+// Every arc's centre is the crossing of the circles about its ends on the side its turn says; the start
+// tangent touches the circle at the start.
+TEST(LandXmlArcs, CentreAndStartTangentAgreeWithTheCircle) {
   SVY_SKIP_WITHOUT_REFDATA();
   const std::vector<Element> arcs = collect("Curve");
   ASSERT_GE(arcs.size(), 5u);
@@ -128,22 +126,14 @@ TEST(LandXmlArcs, CentreRadialLineAndStartTangentAgreeWithTheCircle) {
     ASSERT_EQ(IntersectionCoordsOfTwoCircles(start, radius, end, rEnd, s1, s2), 2);
     // A clockwise (right-turning) arc has its centre right of the chord start -> end.
     const C2dPos& found = textAttribute(arc.head, "rot") == "cw" ? s1 : s2;
-    EXPECT_NEAR(found.north(), center.north(), 1e-8);
-    EXPECT_NEAR(found.east(), center.east(), 1e-8);
-    // From the centre outward through the start: the opposite point first, the start second.
-    ASSERT_EQ(IntersectionCoordsOfLineAndCircle(center, start, center, radius, s1, s2), 2);
-    EXPECT_NEAR(s2.north(), start.north(), 1e-8);
-    EXPECT_NEAR(s2.east(), start.east(), 1e-8);
-    EXPECT_NEAR(s1.north(), 2 * center.north() - start.north(), 1e-8);
-    EXPECT_NEAR(s1.east(), 2 * center.east() - start.east(), 1e-8);
+    EXPECT_NEAR(std::hypot(found.north() - center.north(), found.east() - center.east()), 0.0, 1e-8);
     const double dirStart = attribute(arc.head, "dirStart") * arc.radiansPerUnit;
     if (std::isnan(dirStart)) continue;
     double e = 0, n = 0;
     Radiate2D(start.east(), start.north(), dirStart, 40.0, e, n);
     ASSERT_EQ(IntersectionCoordsOfLineAndCircle(start, C2dPos(n, e), center, radius, s1, s2), 1);
     // The touching point moves along the line by the published rounding of the positions.
-    EXPECT_NEAR(s1.north(), start.north(), 1e-5);
-    EXPECT_NEAR(s1.east(), start.east(), 1e-5);
+    EXPECT_NEAR(std::hypot(s1.north() - start.north(), s1.east() - start.east()), 0.0, 1e-5);
     ++tangentsChecked;
   }
   EXPECT_GT(tangentsChecked, 0);
