@@ -22,8 +22,6 @@ namespace curve_test {
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 constexpr double kInf = std::numeric_limits<double>::infinity();
 
-inline CMathAngle azimuthDeg(double degrees) { return CMathAngle(degrees); }
-
 inline void expectPosNear(const C2dPos& actual, double north, double east, double tol) {
   EXPECT_NEAR(actual.north(), north, tol);
   EXPECT_NEAR(actual.east(), east, tol);
@@ -40,18 +38,18 @@ inline double distance(const C2dPos& a, const C2dPos& b) {
   return std::hypot(a.north() - b.north(), a.east() - b.east());
 }
 
-// An arc element starting at (north, east) heading azimuthDeg, of the given length and radius magnitude.
+// An arc element starting at (north, east) heading azDeg degrees, of the given length and radius magnitude.
 inline CCurveArc makeArc(double north, double east, double azDeg, double length, double radius, bool toTheRight) {
   CCurveDataArc data;
   data.SetElement(length, radius, toTheRight);
-  return CCurveArc(north, east, azimuthDeg(azDeg), data);
+  return CCurveArc(north, east, CMathAngle(azDeg), data);
 }
 
 inline CCurveSegment makeSegment(double north, double east, double azDeg, double length) {
   CCurveDataSegment data;
   data.setLen(length);
   data.setAzDeg(0.0);
-  return CCurveSegment(north, east, azimuthDeg(azDeg), data);
+  return CCurveSegment(north, east, CMathAngle(azDeg), data);
 }
 
 // A full spiral element of length L to radius R.
@@ -59,24 +57,16 @@ inline CCurveSpiral makeSpiral(double north, double east, double azDeg, double l
                                bool isTSSC, AlntMathSpiralType law = eMathSpiralEuler) {
   CCurveDataSpiral data(law);
   data.setLenAndR(length, radius, toTheRight, isTSSC);
-  return CCurveSpiral(north, east, azimuthDeg(azDeg), data);
+  return CCurveSpiral(north, east, CMathAngle(azDeg), data);
 }
 
 // Smallest distance from p to the segment over a dense sampling of its length (an independent oracle for
-// projections), with the sampled length of the nearest sample.
-inline double sampledDistance(const CGenericSegment& segment, const C2dPos& p, int samples,
-                              double* atLength = nullptr) {
-  double best = std::numeric_limits<double>::infinity();
-  const double total = segment.getTotalLength();
+// projections).
+inline double sampledDistance(const CGenericSegment& segment, const C2dPos& p, int samples) {
+  double best = kInf;
+  C2dPos q;
   for (int i = 0; i <= samples; ++i) {
-    const double s = total * i / samples;
-    C2dPos q;
-    if (!segment.getPosAtLength(s, q)) continue;
-    const double d = distance(p, q);
-    if (d < best) {
-      best = d;
-      if (atLength != nullptr) *atLength = s;
-    }
+    if (segment.getPosAtLength(segment.getTotalLength() * i / samples, q)) best = std::fmin(best, distance(p, q));
   }
   return best;
 }

@@ -7,9 +7,9 @@
 #include <cmath>
 #include <initializer_list>
 #include <memory>
+#include <string>
 #include <tuple>
 #include <vector>
-#include <string>
 
 #include "curve_test_support.h"
 #include "svymath/curves/generic_line_impl.h"

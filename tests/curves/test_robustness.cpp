@@ -79,12 +79,12 @@ TEST(CurveRange, UndefinedCurvesFailWithALogEntryAndZeroValues) {
   ASSERT_TRUE(tangent.setLen(20.0));
   EXPECT_FALSE(tangent.getPosAtLength(1.0, n, e));  // a length without an azimuth
   EXPECT_EQ(capture.count(), 5u);
-  EXPECT_EQ(clothoid.GetAzimuth(10.0), 0.0);
-  EXPECT_EQ(clothoid.getCurvatureAtLength(10.0), 0.0);
-  EXPECT_EQ(clothoid.getLengthAtAzimuth(CMathAngle(10.0)), 0.0);
+  for (const double zero : {clothoid.GetAzimuth(10.0), clothoid.getCurvatureAtLength(10.0),
+                            clothoid.getLengthAtAzimuth(CMathAngle(10.0)), spiral.getCurvatureAtLength(1.0)}) {
+    EXPECT_EQ(zero, 0.0);
+  }
   EXPECT_TRUE(clothoid.checkStepForDeviation(10.0, 0.0, 0.01));
   EXPECT_FALSE(spiral.getShortestDistAndCurveLen(1.0, 1.0, dist, len));
-  EXPECT_EQ(spiral.getCurvatureAtLength(1.0), 0.0);
   EXPECT_TRUE(std::isnan(spiral.getFinalNorthing()));
 }
 
