@@ -16,30 +16,6 @@ namespace {
 constexpr double kPi = svy_math::units::kPi;
 constexpr double kTwoPi = svy_math::units::kTwoPi;
 
-// An arc in polar form: centre, radius, azimuth of the start seen from the centre, signed sweep
-// (clockwise positive).
-struct PolarArc {
-  const char* name;
-  C2dPos centre;
-  double radius;
-  double startRadial;
-  double sweep;
-  double tolerance;
-
-  C2dPos pointAt(double radial) const {
-    return C2dPos(centre.north() + radius * std::cos(radial), centre.east() + radius * std::sin(radial));
-  }
-  C2dPos start() const { return pointAt(startRadial); }
-  C2dPos finish() const { return pointAt(startRadial + sweep); }
-  bool clockwise() const { return sweep > 0; }
-  // The tangent is a quarter turn from the radius, towards the direction of travel.
-  double tangentAt(double radial) const { return radial + (clockwise() ? kPi / 2 : -kPi / 2); }
-  double startTangent() const { return tangentAt(startRadial); }
-  double finishTangent() const { return tangentAt(startRadial + sweep); }
-};
-
-std::ostream& operator<<(std::ostream& os, const PolarArc& a) { return os << a.name; }
-
 CMathAngle rad(double r) {
   CMathAngle a;
   a.setRad(r);
@@ -47,55 +23,66 @@ CMathAngle rad(double r) {
 }
 
 void expectSamePos(const C2dPos& actual, const C2dPos& expected, double tol, const std::string& what) {
-  EXPECT_NEAR(actual.north(), expected.north(), tol) << what;
-  EXPECT_NEAR(actual.east(), expected.east(), tol) << what;
+  EXPECT_NEAR(std::hypot(actual.north() - expected.north(), actual.east() - expected.east()), 0.0, tol) << what;
 }
 
-void expectArc(const CArc& arc, const PolarArc& ref, const std::string& setter) {
-  const double tol = ref.tolerance;
-  EXPECT_FALSE(arc.fullCircle) << setter;
-  EXPECT_EQ(arc.clockwise, ref.clockwise()) << setter;
-  expectSamePos(arc.start, ref.start(), tol, setter + " start");
-  expectSamePos(arc.center, ref.centre, tol, setter + " centre");
-  EXPECT_NEAR(arc.getRadius(), ref.radius, tol) << setter;
-  EXPECT_NEAR(arc.getSweep(), ref.sweep, 1e-9) << setter;
-  EXPECT_NEAR(arc.getLength(), ref.radius * std::fabs(ref.sweep), tol) << setter;
-  C2dPos p;
-  ASSERT_TRUE(arc.get_end_pos(p)) << setter;
-  expectSamePos(p, ref.finish(), tol, setter + " finish");
-  ASSERT_TRUE(arc.get_middle_pos_on_the_arc(p)) << setter;
-  expectSamePos(p, ref.pointAt(ref.startRadial + ref.sweep / 2), tol, setter + " middle");
-  CMathAngle az;
-  ASSERT_TRUE(arc.get_start_tgdir(az)) << setter;
-  EXPECT_TRUE(az.isEqual(rad(ref.startTangent()), 1e-9)) << setter << " start tangent " << az.getRad();
-  ASSERT_TRUE(arc.get_end_tgdir(az)) << setter;
-  EXPECT_TRUE(az.isEqual(rad(ref.finishTangent()), 1e-9)) << setter << " finish tangent " << az.getRad();
-}
+// An arc in polar form: centre, radius, azimuth of the start seen from the centre, signed sweep
+// (clockwise positive); the tangent is a quarter turn from the radius, towards the direction of travel.
+struct PolarArc {
+  const char* name;
+  C2dPos centre;
+  double radius, startRadial, sweep, tolerance;
+
+  C2dPos at(double t) const {  // t = 0 at the start, 1 at the end
+    const double r = startRadial + t * sweep;
+    return C2dPos(centre.north() + radius * std::cos(r), centre.east() + radius * std::sin(r));
+  }
+  bool clockwise() const { return sweep > 0; }
+  CMathAngle tangent(double t) const { return rad(startRadial + t * sweep + (clockwise() ? kPi / 2 : -kPi / 2)); }
+
+  void expect(const CArc& arc, const std::string& setter) const {
+    EXPECT_FALSE(arc.fullCircle) << setter;
+    EXPECT_EQ(arc.clockwise, clockwise()) << setter;
+    expectSamePos(arc.start, at(0), tolerance, setter + " start");
+    expectSamePos(arc.center, centre, tolerance, setter + " centre");
+    EXPECT_NEAR(arc.getRadius(), radius, tolerance) << setter;
+    EXPECT_NEAR(arc.getSweep(), sweep, 1e-9) << setter;
+    EXPECT_NEAR(arc.getLength(), radius * std::fabs(sweep), tolerance) << setter;
+    C2dPos p;
+    CMathAngle az;
+    ASSERT_TRUE(arc.get_end_pos(p) && arc.get_start_tgdir(az)) << setter;
+    expectSamePos(p, at(1), tolerance, setter + " finish");
+    EXPECT_TRUE(az.isEqual(tangent(0), 1e-9)) << setter << " start tangent " << az.getRad();
+    ASSERT_TRUE(arc.get_middle_pos_on_the_arc(p) && arc.get_end_tgdir(az)) << setter;
+    expectSamePos(p, at(0.5), tolerance, setter + " middle");
+    EXPECT_TRUE(az.isEqual(tangent(1), 1e-9)) << setter << " finish tangent " << az.getRad();
+  }
+};
 
 class ArcSetters : public ::testing::TestWithParam<PolarArc> {};
 
 TEST_P(ArcSetters, AllAgreeOnTheSameArc) {
   const PolarArc& ref = GetParam();
   const bool cw = ref.clockwise();
+  const C2dPos start = ref.at(0), finish = ref.at(1);
   CArc arc;
   const auto check = [&](bool set, const char* setter) {
     ASSERT_TRUE(set) << setter;
-    expectArc(arc, ref, setter);
+    ref.expect(arc, setter);
   };
-  check(arc.set_start_center_finish(ref.start(), ref.centre, ref.finish(), cw), "start_center_finish");
-  const CMathAngle startRadial = rad(ref.startRadial), finishRadial = rad(ref.startRadial + ref.sweep);
-  check(arc.set_r_start_center_finish(ref.radius, startRadial, ref.centre, finishRadial, cw), "r_start_center_finish");
-  check(arc.set_start_finish_bulge(ref.start(), ref.finish(), std::tan(ref.sweep / 4)), "bulge");
-  check(arc.set_start_finish_startTgDir(ref.start(), ref.finish(), rad(ref.startTangent())), "startTgDir");
-  check(arc.set_start_finish_finishTgDir(ref.start(), ref.finish(), rad(ref.finishTangent())), "finishTgDir");
-  check(arc.set_start_finish_plusPos(ref.start(), ref.finish(), ref.pointAt(ref.startRadial + ref.sweep / 3)),
-        "plusPos");
-  check(arc.set_start_r_length(ref.start(), rad(ref.startTangent()), ref.radius, ref.radius * std::fabs(ref.sweep), cw),
-        "r_length");
+  check(arc.set_start_center_finish(start, ref.centre, finish, cw), "start_center_finish");
+  check(arc.set_r_start_center_finish(ref.radius, rad(ref.startRadial), ref.centre, rad(ref.startRadial + ref.sweep),
+                                      cw),
+        "r_start_center_finish");
+  check(arc.set_start_finish_bulge(start, finish, std::tan(ref.sweep / 4)), "bulge");
+  check(arc.set_start_finish_startTgDir(start, finish, ref.tangent(0)), "startTgDir");
+  check(arc.set_start_finish_finishTgDir(start, finish, ref.tangent(1)), "finishTgDir");
+  check(arc.set_start_finish_plusPos(start, finish, ref.at(1.0 / 3)), "plusPos");
+  check(arc.set_start_r_length(start, ref.tangent(0), ref.radius, ref.radius * std::fabs(ref.sweep), cw), "r_length");
   if (std::fabs(ref.sweep) > kPi) return;  // the remaining setters define arcs up to a half circle
-  check(arc.set_r_start_finish(ref.radius, ref.start(), ref.finish(), cw), "r_start_finish");
-  check(arc.set_start_center_cAngle(ref.start(), ref.centre, rad(std::fabs(ref.sweep)), cw), "start_center_cAngle");
-  check(arc.set_start_finish_turn(ref.start(), ref.finish(), rad(ref.sweep)), "turn");
+  check(arc.set_r_start_finish(ref.radius, start, finish, cw), "r_start_finish");
+  check(arc.set_start_center_cAngle(start, ref.centre, rad(std::fabs(ref.sweep)), cw), "start_center_cAngle");
+  check(arc.set_start_finish_turn(start, finish, rad(ref.sweep)), "turn");
 }
 
 INSTANTIATE_TEST_SUITE_P(

@@ -89,19 +89,11 @@ TEST(NumberTextRoundTrip, WrittenTextReadsBackAsTheRoundedValue) {
     const CSvyString text = svy_formats::DoubleToString(value, places);
     ASSERT_TRUE(svy_formats::StringToDouble(text, parsed)) << text.ToNarrow();
     EXPECT_EQ(parsed, svy::math::round_prec(value, places)) << text.ToNarrow();
-    // And the value parsed prints as the same text.
     EXPECT_EQ(svy_formats::DoubleToString(parsed, places).str(), text.str());
   }
 }
 
-TEST(NumberTextRoundTrip, ShortestTextsSurviveValueAndBack) {
-  const std::pair<const wchar_t*, int> texts[] = {{L"2.675", 3}, {L"5000000.125", 3}, {L"1e-07", 7}};
-  for (const auto& t : texts) {
-    double value = 0.0, again = 0.0;
-    ASSERT_TRUE(svy_formats::StringToDouble(CSvyString(t.first), value));
-    ASSERT_TRUE(svy_formats::StringToDouble(svy_formats::DoubleToString(value, t.second), again));
-    EXPECT_EQ(again, value) << t.second;
-  }
+TEST(NumberText, ReplaceCommasWithDecPt) {
   CSvyString text(L"1,5;2,25,");
   svy_formats::ReplaceCommasWithDecPt(text);
   EXPECT_EQ(text.str(), L"1.5;2.25.");
@@ -128,8 +120,7 @@ class CommaLocaleHost : public ::testing::Test {
   static void expectCLocaleText() {
     EXPECT_EQ(svy_formats::DoubleToString(1234.5, 2).str(), L"1234.50");
     double value = 0.0;
-    EXPECT_TRUE(svy_formats::StringToDouble(CSvyString(L"1234.5"), value));
-    EXPECT_EQ(value, 1234.5);
+    EXPECT_TRUE(svy_formats::StringToDouble(CSvyString(L"1234.5"), value) && value == 1234.5);
     EXPECT_FALSE(svy_formats::StringToDouble(CSvyString(L"1234,5"), value));
     CSvyString formatted;
     formatted.Format(L"%.2f|%d", 1234.5, 1234567);

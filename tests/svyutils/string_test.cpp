@@ -135,8 +135,7 @@ TEST(SvyStringFormat, PrintfConversionsPositionalArgumentsAndLongOutput) {
 
 TEST(SvyStringOperators, ConcatenateAndCompare) {
   CSvyString text = CSvyString(L"1") + L"+" + CSvyString("234", svy_text::kCodePageUtf8) + L'.';
-  text += L"5";
-  EXPECT_TRUE(text == L"1+234.5");
+  EXPECT_TRUE((text += L"5") == L"1+234.5");
   text = static_cast<const wchar_t*>(nullptr);
   EXPECT_TRUE(text.IsEmpty());
 }
