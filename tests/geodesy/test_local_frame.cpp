@@ -2,6 +2,7 @@
 
 #include <GeographicLib/Geocentric.hpp>
 #include <GeographicLib/LocalCartesian.hpp>
+#include <algorithm>
 #include <cmath>
 #include <limits>
 
