@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -95,16 +94,13 @@ TEST(QuadraticRoots, CountAndOrderOfTheRoots) {
 
 // a (x - r1)(x - r2) for well separated roots: the returned roots are r1 and r2.
 TEST(QuadraticRoots, RootsOfBuiltPolynomials) {
-  const double roots[][2] = {{-3.5, 12.25}, {0.001, 1000.0}};
-  for (double a : {-2.5, 1e-6, 3e4}) {
-    for (const auto& r : roots) {
-      SCOPED_TRACE(::testing::Message() << a << " " << r[0] << " " << r[1]);
-      double x1 = 0, x2 = 0;
-      ASSERT_EQ(SolutionTo2ndDegreePolynomial(a, -a * (r[0] + r[1]), a * r[0] * r[1], x1, x2), 2);
-      const double hi = std::max(r[0], r[1]), lo = std::min(r[0], r[1]);
-      EXPECT_NEAR(a > 0 ? x1 : x2, hi, 1e-9 * (1.0 + std::fabs(hi)));
-      EXPECT_NEAR(a > 0 ? x2 : x1, lo, 1e-6 * (1.0 + std::fabs(lo)));
-    }
+  const double cases[][3] = {{-2.5, -3.5, 12.25}, {1e-6, 0.001, 1000.0}, {3e4, 0.001, 1000.0}, {3e4, -3.5, 12.25}};
+  for (const auto& r : cases) {
+    SCOPED_TRACE(::testing::Message() << r[0] << " " << r[1] << " " << r[2]);
+    double x1 = 0, x2 = 0;
+    ASSERT_EQ(SolutionTo2ndDegreePolynomial(r[0], -r[0] * (r[1] + r[2]), r[0] * r[1] * r[2], x1, x2), 2);
+    EXPECT_NEAR(r[0] > 0 ? x1 : x2, r[2], 1e-9 * (1.0 + std::fabs(r[2])));
+    EXPECT_NEAR(r[0] > 0 ? x2 : x1, r[1], 1e-6 * (1.0 + std::fabs(r[1])));
   }
 }
 
