@@ -5,15 +5,15 @@
 #include <cmath>
 #include <limits>
 
+#include "support/geometry.h"
 #include "svymath/foundation/constants.h"
 
 namespace {
 
 using svy_math::units::kDegToRad;
+using svy_test::dist;
 
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
-
-double dist(const C2dPos& a, const C2dPos& b) { return std::hypot(a.north() - b.north(), a.east() - b.east()); }
 
 // The point of the circle at azimuth `azimuthDeg` from its centre.
 C2dPos onCircle(const C2dPos& center, double radius, double azimuthDeg) {

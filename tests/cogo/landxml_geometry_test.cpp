@@ -14,6 +14,7 @@
 #include <string>
 #include <vector>
 
+#include "support/geometry.h"
 #include "support/refdata.h"
 #include "svymath/cogo/circle_solvers.h"
 #include "svymath/cogo/inverse_radiate.h"
@@ -104,7 +105,7 @@ TEST(LandXmlLines, InverseGivesThePublishedDirectionAndLength) {
       EXPECT_NEAR(std::remainder(azimuth - published, 2 * kPi), 0.0, kPublishedPos / distance + 1e-9);
       double e = 0, n = 0;
       Radiate2D(start.east(), start.north(), published, attribute(line.head, "length"), e, n);
-      EXPECT_NEAR(std::hypot(n - end.north(), e - end.east()), 0.0, kPublishedPos);
+      EXPECT_NEAR(svy_test::dist(C2dPos(n, e), end), 0.0, kPublishedPos);
     }
   }
 }
@@ -126,14 +127,14 @@ TEST(LandXmlArcs, CentreAndStartTangentAgreeWithTheCircle) {
     ASSERT_EQ(IntersectionCoordsOfTwoCircles(start, radius, end, rEnd, s1, s2), 2);
     // A clockwise (right-turning) arc has its centre right of the chord start -> end.
     const C2dPos& found = textAttribute(arc.head, "rot") == "cw" ? s1 : s2;
-    EXPECT_NEAR(std::hypot(found.north() - center.north(), found.east() - center.east()), 0.0, 1e-8);
+    EXPECT_NEAR(svy_test::dist(found, center), 0.0, 1e-8);
     const double dirStart = attribute(arc.head, "dirStart") * arc.radiansPerUnit;
     if (std::isnan(dirStart)) continue;
     double e = 0, n = 0;
     Radiate2D(start.east(), start.north(), dirStart, 40.0, e, n);
     ASSERT_EQ(IntersectionCoordsOfLineAndCircle(start, C2dPos(n, e), center, radius, s1, s2), 1);
     // The touching point moves along the line by the published rounding of the positions.
-    EXPECT_NEAR(std::hypot(s1.north() - start.north(), s1.east() - start.east()), 0.0, 1e-5);
+    EXPECT_NEAR(svy_test::dist(s1, start), 0.0, 1e-5);
     ++tangentsChecked;
   }
   EXPECT_GT(tangentsChecked, 0);

@@ -8,6 +8,7 @@
 #include <string>
 #include <utility>
 
+#include "support/geometry.h"
 #include "svymath/foundation/arc.h"
 #include "svymath/foundation/constants.h"
 
@@ -16,14 +17,10 @@ namespace {
 constexpr double kPi = svy_math::units::kPi;
 constexpr double kTwoPi = svy_math::units::kTwoPi;
 
-CMathAngle rad(double r) {
-  CMathAngle a;
-  a.setRad(r);
-  return a;
-}
+using svy_test::radians;
 
 void expectSamePos(const C2dPos& actual, const C2dPos& expected, double tol, const std::string& what) {
-  EXPECT_NEAR(std::hypot(actual.north() - expected.north(), actual.east() - expected.east()), 0.0, tol) << what;
+  EXPECT_NEAR(svy_test::dist(actual, expected), 0.0, tol) << what;
 }
 
 // An arc in polar form: centre, radius, azimuth of the start seen from the centre, signed sweep
@@ -38,7 +35,9 @@ struct PolarArc {
     return C2dPos(centre.north() + radius * std::cos(r), centre.east() + radius * std::sin(r));
   }
   bool clockwise() const { return sweep > 0; }
-  CMathAngle tangent(double t) const { return rad(startRadial + t * sweep + (clockwise() ? kPi / 2 : -kPi / 2)); }
+  CMathAngle tangent(double t) const {
+    return radians(startRadial + t * sweep + (clockwise() ? kPi / 2 : -kPi / 2));
+  }
 
   void expect(const CArc& arc, const std::string& setter) const {
     EXPECT_FALSE(arc.fullCircle) << setter;
@@ -71,9 +70,8 @@ TEST_P(ArcSetters, AllAgreeOnTheSameArc) {
     ref.expect(arc, setter);
   };
   check(arc.set_start_center_finish(start, ref.centre, finish, cw), "start_center_finish");
-  check(arc.set_r_start_center_finish(ref.radius, rad(ref.startRadial), ref.centre, rad(ref.startRadial + ref.sweep),
-                                      cw),
-        "r_start_center_finish");
+  const CMathAngle startRadial = radians(ref.startRadial), finishRadial = radians(ref.startRadial + ref.sweep);
+  check(arc.set_r_start_center_finish(ref.radius, startRadial, ref.centre, finishRadial, cw), "r_start_center_finish");
   check(arc.set_start_finish_bulge(start, finish, std::tan(ref.sweep / 4)), "bulge");
   check(arc.set_start_finish_startTgDir(start, finish, ref.tangent(0)), "startTgDir");
   check(arc.set_start_finish_finishTgDir(start, finish, ref.tangent(1)), "finishTgDir");
@@ -81,8 +79,8 @@ TEST_P(ArcSetters, AllAgreeOnTheSameArc) {
   check(arc.set_start_r_length(start, ref.tangent(0), ref.radius, ref.radius * std::fabs(ref.sweep), cw), "r_length");
   if (std::fabs(ref.sweep) > kPi) return;  // the remaining setters define arcs up to a half circle
   check(arc.set_r_start_finish(ref.radius, start, finish, cw), "r_start_finish");
-  check(arc.set_start_center_cAngle(start, ref.centre, rad(std::fabs(ref.sweep)), cw), "start_center_cAngle");
-  check(arc.set_start_finish_turn(start, finish, rad(ref.sweep)), "turn");
+  check(arc.set_start_center_cAngle(start, ref.centre, radians(std::fabs(ref.sweep)), cw), "start_center_cAngle");
+  check(arc.set_start_finish_turn(start, finish, radians(ref.sweep)), "turn");
 }
 
 INSTANTIATE_TEST_SUITE_P(
@@ -110,19 +108,19 @@ TEST(ArcSetters, HalfAndFullCircles) {
   ASSERT_TRUE(arc.set_r_start_finish(5.0 - 1e-13, C2dPos(0, 0), C2dPos(0, 10), true));
   EXPECT_NEAR(std::fabs(arc.getSweep()), kPi, 1e-6);
 
-  ASSERT_TRUE(arc.set_center_R_startAz_direction(C2dPos(10, 20), 5, rad(0), true));
+  ASSERT_TRUE(arc.set_center_R_startAz_direction(C2dPos(10, 20), 5, radians(0), true));
   expectSamePos(arc.start, C2dPos(10, 15), 1e-12, "clockwise start lies west for a north tangent");
   EXPECT_TRUE(arc.fullCircle);
   EXPECT_DOUBLE_EQ(arc.getSweep(), kTwoPi);
   EXPECT_NEAR(arc.getLength(), kTwoPi * 5, 1e-12);
   ASSERT_TRUE(arc.get_middle_pos_on_the_arc(middle));
   expectSamePos(middle, C2dPos(10, 25), 1e-12, "opposite point");
-  ASSERT_TRUE(arc.set_center_R_startAz_direction(C2dPos(10, 20), 5, rad(kPi / 2), false));
+  ASSERT_TRUE(arc.set_center_R_startAz_direction(C2dPos(10, 20), 5, radians(kPi / 2), false));
   expectSamePos(arc.start, C2dPos(5, 20), 1e-12, "counter-clockwise start lies south for an east tangent");
   EXPECT_DOUBLE_EQ(arc.getSweep(), -kTwoPi);
   ASSERT_TRUE(arc.set_start_center_finish(C2dPos(0, 5), C2dPos(0, 0), C2dPos(0, 9), false));
   EXPECT_TRUE(arc.fullCircle);
-  ASSERT_TRUE(arc.set_start_r_length(C2dPos(0, 0), rad(0), 2.0, kTwoPi * 2.0, true));
+  ASSERT_TRUE(arc.set_start_r_length(C2dPos(0, 0), radians(0), 2.0, kTwoPi * 2.0, true));
   EXPECT_TRUE(arc.fullCircle);
   expectSamePos(arc.center, C2dPos(0, 2), 1e-12, "centre right of a north tangent");
 }
@@ -135,23 +133,23 @@ TEST(ArcFailures, LeaveTheRecordUnchanged) {
   const C2dPos a(0, 0), b(0, 10), c(0, 20);
   const std::pair<const char*, bool> results[] = {
       {"zero radius", arc.set_center_R(a, 0)},
-      {"negative radius", arc.set_center_R_startAz_direction(a, -1, rad(0), true)},
+      {"negative radius", arc.set_center_R_startAz_direction(a, -1, radians(0), true)},
       {"nan radius", arc.set_center_R(a, nan)},
       {"chord beyond diameter", arc.set_r_start_finish(4.9, a, b, true)},
       {"coincident ends", arc.set_r_start_finish(5, a, a, true)},
       {"start on centre", arc.set_start_center_finish(a, a, b, true)},
       {"finish on centre", arc.set_start_center_finish(b, a, a, true)},
-      {"zero central angle", arc.set_start_center_cAngle(b, a, rad(0), true)},
+      {"zero central angle", arc.set_start_center_cAngle(b, a, radians(0), true)},
       {"zero bulge", arc.set_start_finish_bulge(a, b, 0)},
       {"nan bulge", arc.set_start_finish_bulge(a, b, nan)},
       {"bulge on coincident ends", arc.set_start_finish_bulge(a, a, 1)},
       {"collinear plus point", arc.set_start_finish_plusPos(a, c, b)},
       {"plus point on start", arc.set_start_finish_plusPos(a, c, a)},
-      {"tangent along chord", arc.set_start_finish_startTgDir(a, b, rad(kPi / 2))},
-      {"tangent against chord", arc.set_start_finish_finishTgDir(a, b, rad(-kPi / 2))},
-      {"zero turn", arc.set_start_finish_turn(a, b, rad(0))},
-      {"length beyond circumference", arc.set_start_r_length(a, rad(0), 1, 7, true)},
-      {"zero length", arc.set_start_r_length(a, rad(0), 1, 0, true)},
+      {"tangent along chord", arc.set_start_finish_startTgDir(a, b, radians(kPi / 2))},
+      {"tangent against chord", arc.set_start_finish_finishTgDir(a, b, radians(-kPi / 2))},
+      {"zero turn", arc.set_start_finish_turn(a, b, radians(0))},
+      {"length beyond circumference", arc.set_start_r_length(a, radians(0), 1, 7, true)},
+      {"zero length", arc.set_start_r_length(a, radians(0), 1, 0, true)},
       {"nan start", arc.set_start_center_finish(C2dPos(nan, 0), a, b, true)},
   };
   for (const auto& r : results) EXPECT_FALSE(r.second) << r.first;

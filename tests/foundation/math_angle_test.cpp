@@ -5,21 +5,17 @@
 #include <cmath>
 #include <limits>
 
+#include "support/geometry.h"
 #include "svymath/foundation/constants.h"
 #include "svymath/foundation/math_angle.h"
 #include "svymath/foundation/tangle.h"
 
 namespace {
 
+using svy_test::radians;
 constexpr double kPi = svy_math::units::kPi;
 const double kNaN = std::numeric_limits<double>::quiet_NaN();
 const double kInf = std::numeric_limits<double>::infinity();
-
-CMathAngle radians(double r) {
-  CMathAngle a;
-  a.setRad(r);
-  return a;
-}
 
 CMathAngle unset() {
   CMathAngle a;
