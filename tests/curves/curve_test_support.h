@@ -86,6 +86,32 @@ inline void expectBoxHoldsSamples(const CGenericSegment& segment, int samples, d
   EXPECT_NEAR(box.maxEast, sampled.maxEast, tight);
 }
 
+// Walking the segment by deviation steps reaches its end point; no point of the segment strays from the chord
+// of its step by more than the deviation (1e-9 m left for rounding at grid coordinates).
+inline void expectStepsWithinDeviation(const CGenericSegment& segment, double deviation) {
+  const double total = segment.getTotalLength();
+  double s = 0.0;
+  int steps = 0;
+  C2dPos from = segment.getStartPos(), to;
+  for (; s < total && steps < 10000; ++steps) {
+    const double next = segment.getNextPosForDeviation(s, deviation, to);
+    ASSERT_TRUE(next > s && next <= total + 1e-9) << s;
+    double worst = 0.0;
+    for (int i = 1; i < 16; ++i) {
+      const C2dPos p = posAt(segment, s + (next - s) * i / 16.0);
+      worst = std::fmax(worst, std::fabs((to.north() - from.north()) * (p.east() - from.east()) -
+                                         (to.east() - from.east()) * (p.north() - from.north())) /
+                                   distance(from, to));
+    }
+    EXPECT_LE(worst, deviation + 1e-9) << s;
+    s = next;
+    from = to;
+  }
+  EXPECT_GT(steps, 1);
+  EXPECT_NEAR(s, total, 1e-9);
+  EXPECT_EQ(from, segment.getEndPos());
+}
+
 // Rows of numbers of a CSV file after its header lines; any blank, comma, tab or CR separates fields.
 inline std::vector<std::vector<double>> readNumericTable(const std::string& path, int headerLines = 1) {
   std::vector<std::vector<double>> rows;

@@ -69,20 +69,7 @@ TEST(ArcData, StepForDeviation) {
     ASSERT_TRUE(data.SetElement(c.length, c.radius, true));
     EXPECT_NEAR(data.getStepForDeviation(c.start, c.deviation), c.expected, 1e-9);
   }
-  // Walking an element by deviation steps reaches its end, the sagitta of each chord within the deviation.
-  const CCurveArc arc = makeArc(300.0, 400.0, 200.0, 180.0, 250.0, false);
-  double s = 0.0;
-  C2dPos previous = arc.getStartPos(), next;
-  for (int steps = 0; s < arc.getTotalLength() && steps < 1000; ++steps) {
-    const double reached = arc.getNextPosForDeviation(s, 0.02, next);
-    ASSERT_GT(reached, s);
-    const C2dPos mid(0.5 * (previous.north() + next.north()), 0.5 * (previous.east() + next.east()));
-    EXPECT_LE(distance(mid, posAt(arc, 0.5 * (s + reached))), 0.02 + 1e-9);
-    s = reached;
-    previous = next;
-  }
-  EXPECT_NEAR(s, 180.0, 1e-12);
-  EXPECT_EQ(previous, arc.getEndPos());
+  curve_test::expectStepsWithinDeviation(makeArc(300.0, 400.0, 200.0, 180.0, 250.0, false), 0.02);
 }
 
 // Closed-form oracle of the placed arc: centre on the right for a right turn, points at R from it, chords

@@ -148,7 +148,7 @@ TEST(ArcFromTangents, TouchesBothTangentsAndPassesThroughThreePoints) {
 // Points on a circle of radius 10 about (3, 4) at azimuths 0, 150 and 300 degrees, clockwise: the arc from
 // the first to the third through the second turns right by 300 degrees, the other way round left.
 TEST(ArcThroughThreePoints, MajorArcsSidesAndDegenerateInput) {
-  auto at = [](double deg) { return C2dPos(3.0 + 10.0 * std::cos(deg * kDegToRad), 4.0 + 10.0 * std::sin(deg * kDegToRad)); };
+  auto at = [](double d) { return C2dPos(3.0 + 10.0 * std::cos(d * kDegToRad), 4.0 + 10.0 * std::sin(d * kDegToRad)); };
   TArcParams arc;
   ASSERT_TRUE(GetArc3PointsParams(at(0.0), at(150.0), at(300.0), arc));
   EXPECT_NEAR(arc.radius, 10.0, 1e-12);

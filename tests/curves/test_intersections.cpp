@@ -102,7 +102,8 @@ TEST(SegmentIntersection, EveryCrossingLiesOnBothPieces) {
   for (double az = 0.0; az < 360.0; az += 23.0) {
     for (double lineAz = 5.0; lineAz < 180.0; lineAz += 31.0) {
       pairs.emplace_back(
-          std::make_shared<CGenericLineImpl>(C2dPos(5000020.0, 500030.0), CMathAngle(lineAz), 400.0, eIntersectUnbounded),
+          std::make_shared<CGenericLineImpl>(C2dPos(5000020.0, 500030.0), CMathAngle(lineAz), 400.0,
+                                             eIntersectUnbounded),
           std::make_shared<CCurveArc>(makeArc(5000000.0, 500000.0, az, 180.0, 75.0, static_cast<int>(az) % 2 == 0)),
           1e-7);
     }

@@ -93,8 +93,7 @@ TEST(SegmentData, EndPointAndLengthWithAzimuthAgree) {
     EXPECT_NEAR(data->GetAzimuth(17.0), std::atan2(-40.0, 30.0) * svy_math::units::kRadToDeg, 1e-12);
     double north = 0.0, east = 0.0;
     ASSERT_TRUE(data->getPosAtLength(10.0, north, east));
-    EXPECT_NEAR(north, 6.0, 1e-12);
-    EXPECT_NEAR(east, -8.0, 1e-12);
+    curve_test::expectPosNear(C2dPos(north, east), 6.0, -8.0, 1e-12);
     EXPECT_NEAR(data->getStepForDeviation(12.5, 0.001), 37.5, 1e-12);
   }
   EXPECT_FALSE(byLength.setLen(-1.0));
@@ -136,8 +135,7 @@ TEST(TLine, AzimuthAndLengthFormMatchesTwoPointFormAndEmptyLineGivesNothing) {
   double n1 = 0.0, e1 = 0.0, n2 = 0.0, e2 = 0.0;
   ASSERT_TRUE(fromAzimuth.getPosAtLengthAndOffset(20.0, -3.0, n1, e1));
   ASSERT_TRUE(fromPoints.getPosAtLengthAndOffset(20.0, -3.0, n2, e2));
-  EXPECT_NEAR(n1, n2, 1e-12);
-  EXPECT_NEAR(e1, e2, 1e-12);
+  curve_test::expectPosNear(C2dPos(n1, e1), n2, e2, 1e-12);
   EXPECT_FALSE(TLine().isok());
   EXPECT_FALSE(TLine().getPosAtLength(1.0, n1, e1));
   EXPECT_EQ(n1, n2);  // untouched
