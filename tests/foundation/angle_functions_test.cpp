@@ -106,8 +106,7 @@ TEST(InstrumentReadings, FacesAndCirclesAreInvolutions) {
     EXPECT_NEAR(HL2HR(HR2HL(h)), h, 1e-9) << h;
     EXPECT_NEAR(Level2Zenith(Zenith2Level(h)), h, 1e-9) << h;
   }
-  EXPECT_EQ(HR2HL(90), 270);
-  EXPECT_EQ(Zenith2Level(100), 350);
+  EXPECT_TRUE(HR2HL(90) == 270 && Zenith2Level(100) == 350);
   double hz = 10, v = 80;
   CalcReverseAngles(hz, v);
   EXPECT_TRUE(hz == 190 && v == 280 && IsFaceReversed(v));
@@ -150,14 +149,11 @@ TEST(Sexagesimal, DegreesToDmsAndBack) {
   EXPECT_TRUE(d == 11 && m == 60);
 }
 
-// Packed DDD.MMSS unpacks with carries out of 60 seconds and 60 minutes, and reduces the degrees.
-TEST(PackedDms, UnpacksWithCarries) {
+// Packed DDD.MMSS unpacks with carries out of 60 seconds and 60 minutes, reduces the degrees, and reads back.
+TEST(PackedDms, UnpacksWithCarriesAndRoundTrips) {
   const double cases[][2] = {{-12.3030, -(12.0 + 30.0 / 60 + 30.0 / 3600)}, {12.3060, 12.0 + 31.0 / 60},
                              {12.30999999999, 12.0 + 31.0 / 60}, {0.5960, 1.0}, {370.3000, 10.5}};
   for (const auto& c : cases) EXPECT_NEAR(DDDMMSS2Deg(c[0]), c[1], 1e-12) << c[0];
-}
-
-TEST(PackedDms, DegreesToPackedAndBack) {
   for (double x : {1.0 / 3600, -45.25, 123.456789}) {
     for (int prec : {4, 6, 8}) {
       const double packed = Deg2DDDMMSS(x, prec, false);
@@ -173,7 +169,7 @@ TEST(PackedDms, DegreesToPackedAndBack) {
   EXPECT_NEAR(Deg2DDMMDEC(59.99999, 2, false), 60.0, 1e-12);
 }
 
-TEST(PackedDms, SplitNeverReachesSixty) {
+TEST(PackedDms, SplitNeverReachesSixtyAndBadPrecisionIsLogged) {
   bool negative = false;
   int d = 0, m = 0;
   double s = 0;
@@ -187,14 +183,10 @@ TEST(PackedDms, SplitNeverReachesSixty) {
     Deg2DDDMMSS(x, negative, d, m, s, 2);
     EXPECT_TRUE(std::isnan(s)) << x;
   }
-}
-
-TEST(PackedDms, BadPrecisionIsLogged) {
-  svy_logging::CScopedErrLogCapture capture;
+  svy_logging::CScopedErrLogCapture capture;  // a bad precision is logged
   Deg2DDDMMSS(1.0, 3, false);
   ASSERT_GE(capture.count(), 1u);
-  EXPECT_EQ(capture.entries()[0].file, "formats");
-  EXPECT_EQ(capture.entries()[0].message, "");
+  EXPECT_TRUE(capture.entries()[0].file == "formats" && capture.entries()[0].message.empty());
 }
 
 TEST(PackedDmsText, FormatsDegreesMinutesSeconds) {
@@ -210,7 +202,7 @@ TEST(PackedDmsText, FormatsDegreesMinutesSeconds) {
 }
 
 // Three text fields to radians; the sign comes from the degrees (minus zero is an int zero: positive);
-// a field that is no whole number gives 0.
+// a field that is no whole number gives 0; negative minutes or seconds are logged and used.
 TEST(AngleText, ParsesThreeFieldsToRadians) {
   using svy_text::CSvyString;
   struct {
@@ -221,11 +213,7 @@ TEST(AngleText, ParsesThreeFieldsToRadians) {
   for (const auto& c : cases)
     EXPECT_NEAR(AngleToRad(CSvyString(c.d), CSvyString(c.m), CSvyString(c.s)), c.degrees * kPi / 180, 1e-15)
         << c.degrees;
-}
-
-TEST(AngleText, NegativeMinutesOrSecondsAreLoggedAndUsed) {
-  using svy_text::CSvyString;
-  svy_logging::CScopedErrLogCapture capture;
+  svy_logging::CScopedErrLogCapture capture;  // negative minutes or seconds are logged and used
   const double r = AngleToRad(CSvyString(L"10"), CSvyString(L"-30"), CSvyString(L"-36"));
   EXPECT_EQ(capture.count(), 2u);
   EXPECT_NEAR(r, (10.0 - 0.5 - 0.01) * kPi / 180, 1e-15);
