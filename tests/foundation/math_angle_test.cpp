@@ -52,7 +52,7 @@ TEST(AngleEquality, OperatorEqualsHasNoWrapButIsEqualHas) {
   EXPECT_FALSE(radians(0.5).isEqual(radians(0.5 + step), step));
   EXPECT_FALSE(radians(0.5 + step).isEqual(radians(0.5), step));
   EXPECT_TRUE(radians(0.5).isEqual(radians(0.5 + step), 2 * step));
-  EXPECT_TRUE(unset() <= radians(0) && unset() >= radians(0));
+  EXPECT_TRUE(unset() <= radians(0) && unset() >= radians(0) && radians(-1) < radians(0.5));
 }
 
 // Each setter in turn (a braced list is evaluated left to right): azimuths clockwise from north, the angle at
@@ -107,10 +107,13 @@ TEST(AngleQueries, TangentsQuadrantsUpperEndAndDms) {
   const TQuadrant q = radians(-1e-17).getQuadrant();  // -1e-17 + 2 pi rounds to exactly 2 pi
   EXPECT_FALSE(q.northward || q.eastward);
   EXPECT_EQ(radians(-1e-17).get0To2PI(), svy_math::units::kTwoPi);
+  EXPECT_NEAR(radians(-kPi / 2).get0To360(), 270, 1e-12);
   int d = 0, m = 0;
   double s = 0;
   CMathAngle(-0.5).getDMS(d, m, s);
   EXPECT_EQ(d * 100 + m, 30);
+  CMathAngle(-12.51).getDMS(d, m, s);
+  EXPECT_TRUE(d == -12 && m == 30 && std::fabs(s - 36) < 1e-9);
   // Whole seconds survive the radian round trip without a 60 in any field.
   for (int sec = 0; sec < 360 * 3600; sec += 997) {
     CMathAngle(sec / 3600.0).getDMS(d, m, s);
@@ -123,7 +126,7 @@ TEST(AngleGeometry, DirectionsPositionsAndRotationsFollowTheNorthEastConvention)
   const CMathAngle east(90.0);
   double n = 0, e = 0;
   east.getPosAlong(10, 100, 200, n, e);
-  EXPECT_EQ(C2dPos(n, e), C2dPos(100, 210));
+  EXPECT_NEAR(svy_test::dist(C2dPos(n, e), C2dPos(100, 210)), 0, 1e-12);
   east.getPosAcross(5, 100, 200, n, e);  // right of east-bound travel is south
   EXPECT_NEAR(n, 95, 1e-12);
   EXPECT_NEAR(e, 200, 1e-12);
@@ -144,6 +147,7 @@ TEST(AngleGeometry, DirectionsPositionsAndRotationsFollowTheNorthEastConvention)
   const C2dPos at30(std::cos(kPi / 6), std::sin(kPi / 6));
   EXPECT_TRUE(CMathAngle(30.0).isSameAsAzimuth(C2dPos(0, 0), at30));
   EXPECT_FALSE(CMathAngle(31.0).isSameAsAzimuth(C2dPos(0, 0), at30));
+  EXPECT_TRUE(CMathAngle(89.0).isSharp() && !CMathAngle(-90.0).isSharp());
 }
 
 // Division by (nearly) zero gives 0 from the operator but NaN from the compound form; an unset left operand
@@ -161,7 +165,8 @@ TEST(AngleArithmetic, DivisionByZeroAndUnsetOperands) {
   EXPECT_TRUE(z.isok() && z.getRad() == 0);
   CMathAngle u = unset();
   u += a;
-  EXPECT_TRUE(u.isNan());
+  u *= 2;
+  EXPECT_TRUE(u.isNan() && (unset() * 3.0).isok());
 }
 
 TEST(AngleCaches, ReflectionsKeepCachesConsistentWithTheValue) {
@@ -199,6 +204,8 @@ TEST(TAngleTwin, ConstructsFromRadiansAndSharesTheRules) {
   q /= 0.0;
   EXPECT_TRUE(q.isNan());
   EXPECT_TRUE(svy_math::TAngle(kPi) != svy_math::TAngle(-kPi));
+  EXPECT_TRUE(svy_math::TAngle(0.1) < svy_math::TAngle(0.2));
+  EXPECT_DOUBLE_EQ(svy_math::absoluteAngle(svy_math::TAngle(-1.0)).getDouble(), 1.0);
 }
 
 }  // namespace

@@ -26,7 +26,16 @@ TEST(AbstractPoint, LayoutProductsAndExactComparison) {
   EXPECT_EQ(b / a, P3(4, -2.5, -2));
   EXPECT_EQ(a.maximum(b), P3(4, 5, 3));
   EXPECT_EQ(a.minimum(b), P3(1, -2, -6));
+  EXPECT_EQ(a.abs(), P3(1, 2, 3));
+  EXPECT_EQ(P3(4, 9, 16).sqrt().sum(), 9);
+  EXPECT_EQ(P2(2.5), P2(2.5, 2.5));
   EXPECT_EQ(P3(1, 0, 0).VectorProduct(P3(0, 1, 0)), P3(0, 0, 1));
+  for (const P3& v : {b, P3(1e3, -1e-3, 7)}) {  // orthogonal, with the length of Lagrange's identity
+    const P3 w = a.VectorProduct(v);
+    EXPECT_NEAR(w * a, 0, 1e-12 * w.Module() * a.Module());
+    EXPECT_NEAR(w * v, 0, 1e-12 * w.Module() * v.Module());
+    EXPECT_NEAR(w.ModuleSq(), a.ModuleSq() * v.ModuleSq() - (a * v) * (a * v), 1e-12 * a.ModuleSq() * v.ModuleSq());
+  }
   const P2 withNan(kNaN, 1);
   EXPECT_FALSE(withNan == withNan);
   EXPECT_FALSE(P2(1, 1) == P2(1, 1 + 1e-15));
@@ -41,6 +50,10 @@ TEST(PointConversion, TruncatesTowardZeroAndSaturates) {
     EXPECT_EQ(pt.x, static_cast<long>(c[2])) << c[0];
     EXPECT_EQ(pt.y, static_cast<long>(c[3])) << c[1];
   }
+  POINT pt;
+  pt.x = 3;
+  pt.y = -4;
+  EXPECT_EQ(P2(pt), P2(3, -4));
 }
 
 TEST(Coords, RotateAroundZKeepsDistanceAndHeight) {
@@ -59,6 +72,8 @@ TEST(Coords, RotateAroundZKeepsDistanceAndHeight) {
   t.rotateAroundZ(CMathAngle(-33.0), centre);
   EXPECT_NEAR(t.north, 123.4, 1e-10);
   EXPECT_NEAR(t.east, -56.7, 1e-10);
+  t.east = kNaN;
+  EXPECT_FALSE(t.hasFinitePlanPosition());
 }
 
 TEST(Extents, IncludeGrowsFromEmptyAndSkipsNaN) {

@@ -29,6 +29,7 @@ TEST(FootBasedUnits, AgreeWithTheUnitDefinitions) {
   EXPECT_NEAR(SqureChains2Acres(10, true), 1.000004000012, 1e-15);
   EXPECT_NEAR(USFeet2Meter(3937), 1200, 1e-9);
   EXPECT_NEAR(Meter2USFeet(1200), 3937, 1e-9);
+  EXPECT_NEAR(USFeet2Meter(Meter2USFeet(1234.5678)), 1234.5678, 1e-9);
   EXPECT_EQ(IFeet2Meter(1), 0.3048);
   EXPECT_NEAR(Meter2IFeet(IFeet2Meter(987.65)), 987.65, 1e-12);
 }
