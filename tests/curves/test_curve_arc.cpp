@@ -173,21 +173,15 @@ TEST(ArcElement, ThreePointArcReproducesTheArc) {
 }
 
 TEST(ArcAngleRange, SweepsThroughNorthAndPlain) {
+  const auto in = [](double from, double to, const CMathAngle& angle, double tolerance) {
+    return isAngleRadInRange(CMathAngle(from), CMathAngle(to), angle, tolerance);
+  };
   CMathAngle unset;
   unset.reset();
-  const struct {
-    double from, to;
-    CMathAngle angle;
-    double tolerance;
-    bool inside;
-  } cases[] = {{350.0, 10.0, CMathAngle(0.0), 0.0, true},      {350.0, 10.0, CMathAngle(355.0), 0.0, true},
-               {350.0, 10.0, CMathAngle(180.0), 0.0, false},   {10.0, 20.0, CMathAngle(20.0), 0.0, true},
-               {10.0, 20.0, CMathAngle(20.001), 0.0, false},
-               {10.0, 20.0, CMathAngle(20.001), -0.002 * svy_math::units::kDegToRad, true},
-               {-10.0, 10.0, unset, 0.0, true}};  // undefined counts as 0
-  for (const auto& c : cases) {
-    EXPECT_EQ(isAngleRadInRange(CMathAngle(c.from), CMathAngle(c.to), c.angle, c.tolerance), c.inside) << c.from;
-  }
+  EXPECT_TRUE(in(350.0, 10.0, CMathAngle(0.0), 0.0) && in(350.0, 10.0, CMathAngle(355.0), 0.0));
+  EXPECT_TRUE(in(10.0, 20.0, CMathAngle(20.0), 0.0) && in(-10.0, 10.0, unset, 0.0));  // undefined counts as 0
+  EXPECT_FALSE(in(350.0, 10.0, CMathAngle(180.0), 0.0) || in(10.0, 20.0, CMathAngle(20.001), 0.0));
+  EXPECT_TRUE(in(10.0, 20.0, CMathAngle(20.001), -0.002 * svy_math::units::kDegToRad));
 }
 
 // Published arc tables (start at the origin heading +X, radius positive to the LEFT, X east, Y north):

@@ -137,11 +137,11 @@ TEST(ArcFromTangents, TouchesBothTangentsAndPassesThroughThreePoints) {
   }
   TArcParams arc;
   arc.radius = 7.0;
-  EXPECT_FALSE(GetArcTangentParams(C2dPos(0, 0), 30.0, 30.0, 100.0, arc));  // parallel
-  EXPECT_FALSE(GetArcTangentParams(C2dPos(0, 0), 30.0, 210.0, 100.0, arc));
-  EXPECT_FALSE(GetArcTangentParams(C2dPos(0, 0), 30.0, 60.0, 0.0, arc));
-  EXPECT_FALSE(GetArcTangentParams(C2dPos(0, 0), kNaN, 60.0, 100.0, arc));
-  EXPECT_FALSE(GetArcTangentParams(C2dPos(0, curve_test::kInf), 0.0, 60.0, 100.0, arc));
+  EXPECT_FALSE(GetArcTangentParams(C2dPos(0, 0), 30.0, 30.0, 100.0, arc) ||  // parallel
+               GetArcTangentParams(C2dPos(0, 0), 30.0, 210.0, 100.0, arc) ||
+               GetArcTangentParams(C2dPos(0, 0), 30.0, 60.0, 0.0, arc) ||
+               GetArcTangentParams(C2dPos(0, 0), kNaN, 60.0, 100.0, arc) ||
+               GetArcTangentParams(C2dPos(0, curve_test::kInf), 0.0, 60.0, 100.0, arc));
   EXPECT_EQ(arc.radius, 7.0);
 }
 
@@ -164,10 +164,10 @@ TEST(ArcThroughThreePoints, MajorArcsSidesAndDegenerateInput) {
   EXPECT_NEAR(arc.delta, 180.0, 1e-10);
   EXPECT_TRUE(std::isnan(arc.tangent) && std::isnan(arc.external));
   arc.radius = 7.0;
-  EXPECT_FALSE(GetArc3PointsParams(C2dPos(0, 0), C2dPos(1, 1), C2dPos(2, 2), arc));
-  EXPECT_FALSE(GetArc3PointsParams(C2dPos(0, 0), C2dPos(0, 0), C2dPos(2, 3), arc));
-  EXPECT_FALSE(GetArc3PointsParams(C2dPos(0, 0), C2dPos(1, 5), C2dPos(0, 0), arc));
-  EXPECT_FALSE(GetArc3PointsParams(C2dPos(0, 0), C2dPos(kNaN, 5), C2dPos(2, 3), arc));
+  EXPECT_FALSE(GetArc3PointsParams(C2dPos(0, 0), C2dPos(1, 1), C2dPos(2, 2), arc) ||
+               GetArc3PointsParams(C2dPos(0, 0), C2dPos(0, 0), C2dPos(2, 3), arc) ||
+               GetArc3PointsParams(C2dPos(0, 0), C2dPos(1, 5), C2dPos(0, 0), arc) ||
+               GetArc3PointsParams(C2dPos(0, 0), C2dPos(kNaN, 5), C2dPos(2, 3), arc));
   EXPECT_EQ(arc.radius, 7.0);
 }
 
