@@ -40,30 +40,17 @@ const AngleUnit kAngleUnits[] = {
      kPackedDecimals},
 };
 
-const AngleUnit& angleUnit(const std::string& name) {
-  for (const AngleUnit& unit : kAngleUnits) {
-    if (name == unit.name) return unit;
-  }
-  return kAngleUnits[0];  // names are checked by the option's validator before any row is read
-}
-
-std::vector<std::string> angleUnitNames() {
-  std::vector<std::string> names;
-  for (const AngleUnit& unit : kAngleUnits) names.emplace_back(unit.name);
-  return names;
-}
-
 void addConvert(CLI::App& family) {
   CLI::App* verb = family.add_subcommand("convert", "Convert angles, one value per row");
   auto from = std::make_shared<std::string>();
   auto to = std::make_shared<std::string>();
-  const std::vector<std::string> names = angleUnitNames();
+  const std::vector<std::string> names = svy_tool::unitNames(kAngleUnits);
   svy_tool::addUnitOption(*verb, "--from", *from, names, "Unit of the input values");
   svy_tool::addUnitOption(*verb, "--to", *to, names, "Unit of the output values");
   const std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
   verb->callback([verb, input, from, to] {
-    const AngleUnit& source = angleUnit(*from);
-    const AngleUnit& target = angleUnit(*to);
+    const AngleUnit& source = svy_tool::unitNamed(kAngleUnits, *from);
+    const AngleUnit& target = svy_tool::unitNamed(kAngleUnits, *to);
     const svy_tool::OutputOptions options = svy_tool::outputOptionsFor(*verb);
     const svy_tool::RowFormat format{{"value"}, true, {{"value", target.decimals}}};
     svy_tool::finishVerb(svy_tool::runRows(

@@ -33,23 +33,17 @@ int readPoints(const std::string& path, svy_list<C2dPos>& points) {
     std::cerr << "svy: " << error << '\n';
     return svy_tool::kExitUsage;
   }
-  svy_tool::RowReader reader(*in, {"n", "e"}, true);
+  const svy_tool::RowFormat format{{"n", "e"}, true, {}};
+  svy_tool::RowReader reader(*in, format.inputs, format.numericInput);
   svy_tool::InputRow row;
   int status = svy_tool::kExitOk;
   while (reader.next(row)) {
-    if (row.fields.size() != 2) {
-      svy_tool::reportBadRow(row.lineNumber, "expected 2 numbers, got " + std::to_string(row.fields.size()));
+    if (!svy_tool::checkRow(format, row, error)) {
+      svy_tool::reportBadRow(row.lineNumber, error);
       status = svy_tool::kExitBadRows;
       continue;
     }
-    double north = 0.0;
-    double east = 0.0;
-    if (!svy_tool::parseNumber(row.fields[0], north) || !svy_tool::parseNumber(row.fields[1], east)) {
-      svy_tool::reportBadRow(row.lineNumber, "'" + row.fields[0] + "," + row.fields[1] + "' is not a point n,e");
-      status = svy_tool::kExitBadRows;
-      continue;
-    }
-    points.push_back(C2dPos(north, east));
+    points.push_back(C2dPos(row.numbers[0], row.numbers[1]));
   }
   return status;
 }
@@ -125,16 +119,13 @@ void addRadius(CLI::App& family) {
   const std::shared_ptr<std::string> centreText = std::make_shared<std::string>();
   verb->add_option("--center", *centreText, "Circle centre N,E")->required();
   verb->callback([verb, input, centreText] {
-    const std::string::size_type comma = centreText->find(',');
-    double north = 0.0;
-    double east = 0.0;
-    if (comma == std::string::npos || !svy_tool::parseNumber(centreText->substr(0, comma), north) ||
-        !svy_tool::parseNumber(centreText->substr(comma + 1), east))
+    std::vector<double> centre;
+    if (!svy_tool::parseNumberList(*centreText, 2, centre))
       throw CLI::ValidationError("--center: expected N,E, got '" + *centreText + "'");
     svy_list<C2dPos> points;
     const int readStatus = readPoints(*input, points);
     if (readStatus == svy_tool::kExitUsage) svy_tool::finishVerb(readStatus);
-    svy_math::TBestFitRadiusData data(points, C2dPos(north, east));
+    svy_math::TBestFitRadiusData data(points, C2dPos(centre[0], centre[1]));
     data.setConvergenceCriteria(svy_vector<double>(1, kFitConvergence));
     svy_vector<double> solution;
     const svy_math::ELeastSquaresStatus status = svy_math::gaussNewtonLeastSquares(solution, data);

@@ -40,15 +40,9 @@ double signedLongitudeDeg(double lonRad) {
 
 // Parses "LAT,LON,H" (degrees, degrees, metres).
 bool parseOrigin(const std::string& text, GeoCoord& origin) {
-  const std::string::size_type first = text.find(',');
-  const std::string::size_type second = first == std::string::npos ? first : text.find(',', first + 1);
-  if (second == std::string::npos) return false;
-  double lat = 0.0, lon = 0.0, h = 0.0;
-  if (!svy_tool::parseNumber(text.substr(0, first), lat) ||
-      !svy_tool::parseNumber(text.substr(first + 1, second - first - 1), lon) ||
-      !svy_tool::parseNumber(text.substr(second + 1), h) || !isLatitude(lat))
-    return false;
-  origin = GeoCoord(lat * kDegToRad, lon * kDegToRad, h);
+  std::vector<double> v;
+  if (!svy_tool::parseNumberList(text, 3, v) || !isLatitude(v[0])) return false;
+  origin = GeoCoord(v[0] * kDegToRad, v[1] * kDegToRad, v[2]);
   return true;
 }
 

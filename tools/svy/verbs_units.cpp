@@ -103,30 +103,17 @@ const Unit kUnits[] = {
     {"F", Quantity::kTemperature, FahrenheitToCelsius, CelsiusToFahrenheit, 2},
 };
 
-const Unit& unitNamed(const std::string& name) {
-  for (const Unit& unit : kUnits) {
-    if (name == unit.name) return unit;
-  }
-  return kUnits[0];  // names are checked by the option's validator before any row is read
-}
-
-std::vector<std::string> unitNames() {
-  std::vector<std::string> names;
-  for (const Unit& unit : kUnits) names.emplace_back(unit.name);
-  return names;
-}
-
 void addConvert(CLI::App& family) {
   CLI::App* verb = family.add_subcommand("convert", "Convert values between units of one quantity, one per row");
   auto from = std::make_shared<std::string>();
   auto to = std::make_shared<std::string>();
-  const std::vector<std::string> names = unitNames();
+  const std::vector<std::string> names = svy_tool::unitNames(kUnits);
   svy_tool::addUnitOption(*verb, "--from", *from, names, "Unit of the input values");
   svy_tool::addUnitOption(*verb, "--to", *to, names, "Unit of the output values");
   const std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
   verb->callback([verb, input, from, to] {
-    const Unit& source = unitNamed(*from);
-    const Unit& target = unitNamed(*to);
+    const Unit& source = svy_tool::unitNamed(kUnits, *from);
+    const Unit& target = svy_tool::unitNamed(kUnits, *to);
     if (source.quantity != target.quantity) {
       throw CLI::ValidationError("cannot convert " + std::string(quantityName(source.quantity)) + " (" + *from +
                                  ") to " + quantityName(target.quantity) + " (" + *to + ")");
