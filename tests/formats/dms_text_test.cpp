@@ -19,6 +19,7 @@ TEST(CheckValidDMSVal, AcceptsOnlyWellFormedFieldsWithinTheLimits) {
       {L"90.0030", L"90", true, false},
       {L"45.5", L"360", false, true},  // one digit of minutes is its tens: 50
       {L"45.6", L"360", false, false},    {L"45.3060", L"360", false, false}, {L"45.306", L"360", false, false},
+      {L"45.305", L"360", false, true},
       {L"45.30159999", L"360", false, true},  // digits after the seconds
       {L"-45.3015", L"360", false, true}, {L"  45,3015\t", L"360", false, true}, {L"45-", L"360", false, false},
       {L"45,30,15", L"360", false, false}, {L"45 30", L"360", false, false},   {L"+45", L"360", false, false},

@@ -37,6 +37,7 @@ TEST(ToRange, KeepsBothEndsWrapsByWholePeriodsAndTerminates) {
   // The integer form wraps like the real one and survives the ends of int.
   for (int x = -1000; x <= 1000; x += 7)
     EXPECT_EQ(toRange(x, 0, 360), static_cast<int>(toRange(static_cast<double>(x), 0.0, 360.0))) << x;
+  EXPECT_TRUE(toRange(360, 0, 360) == 360 && toRange(5, 3, 3) == 3);
   const int far = toRange(std::numeric_limits<int>::min(), -180, 180);
   EXPECT_TRUE(far >= -180 && far <= 180);
   EXPECT_LE(toRange(std::numeric_limits<int>::max(), std::numeric_limits<int>::min(), 0), 0);
@@ -128,6 +129,8 @@ TEST(AngleUnits, RoundTripsAndReductions) {
   // Reduction keeps the sign.
   EXPECT_NEAR(Deg2Rad(-370, false), Deg2Rad(-10, true), 1e-15);
   EXPECT_NEAR(Mil2Deg(-7000, false), -33.75, 1e-9);
+  EXPECT_NEAR(Rad2Deg(3 * kPi, false), 180, 1e-9);
+  EXPECT_NEAR(Grad2Deg(500, false), 90, 1e-12);
   // atan3 gives zero for a (nearly) zero vector.
   EXPECT_EQ(atan3(1e-13, -1e-13), 0);
   EXPECT_DOUBLE_EQ(atan3(0, -1), kPi);
@@ -136,6 +139,7 @@ TEST(AngleUnits, RoundTripsAndReductions) {
 // dms_to_deg takes the sign from any field; deg_to_dms puts it on the first non-zero field and reads back.
 TEST(Sexagesimal, DegreesToDmsAndBack) {
   EXPECT_DOUBLE_EQ(dms_to_deg(-12, 30, 36), -12.51);
+  EXPECT_DOUBLE_EQ(dms_to_deg(0, -30, 0), -0.5);
   EXPECT_DOUBLE_EQ(dms_to_deg(0, 0, -36), -0.01);
   double d = 0, m = 0, s = 0;
   for (double x : {0.0, -0.5, -12.51, 123.456789, 359.75}) {
@@ -166,6 +170,7 @@ TEST(PackedDms, UnpacksWithCarriesAndRoundTrips) {
   EXPECT_NEAR(Deg2DDDMMSS(370.5, 4, true), 370.3, 1e-12);
   // Degrees and decimal minutes: reduced, and rounded minutes may reach 60.
   EXPECT_NEAR(Deg2DDMMDEC(-12.51, 3, false), -12.306, 1e-12);
+  EXPECT_NEAR(Deg2DDMMDEC(370.25, 2, false), 10.15, 1e-12);
   EXPECT_NEAR(Deg2DDMMDEC(59.99999, 2, false), 60.0, 1e-12);
 }
 
@@ -187,6 +192,9 @@ TEST(PackedDms, SplitNeverReachesSixtyAndBadPrecisionIsLogged) {
   Deg2DDDMMSS(1.0, 3, false);
   ASSERT_GE(capture.count(), 1u);
   EXPECT_TRUE(capture.entries()[0].file == "formats" && capture.entries()[0].message.empty());
+  const std::size_t before = capture.count();
+  Deg2DDDMMSS(1.0, 4, false);
+  EXPECT_EQ(capture.count(), before);
 }
 
 TEST(PackedDmsText, FormatsDegreesMinutesSeconds) {
@@ -194,7 +202,7 @@ TEST(PackedDmsText, FormatsDegreesMinutesSeconds) {
     double packed;
     int prec;
     const wchar_t* text;
-  } const cases[] = {{12.0502, 1, L"12\u00B05'2.0\""},
+  } const cases[] = {{12.0502, 1, L"12\u00B05'2.0\""},  {-12.3030, 0, L"-12\u00B030'30\""},
                      {-0.3000, 0, L"0\u00B030'0\""},    // the sign rides on the degrees: lost between -1 and 0
                      {12.595999, 0, L"13\u00B00'0\""},  // rounded seconds carry into minutes and degrees
                      {12.3060, 0, L"12\u00B031'0\""}};

@@ -27,9 +27,10 @@ TEST(StringToNumber, ParsesWholeTextOrLeavesOutputAlone) {
     const wchar_t* text;
     bool ok;
     int value;
-  } const ints[] = {{L" \t-17 \n", true, -17}, {L"-2147483648", true, -2147483647 - 1}, {L"2147483648", false, 0},
-                    {L"   ", false, 0},          {L"1.0", false, 0},   {L"1 2", false, 0},
-                    {L"+-1", false, 0},          {L"0x1F", false, 0},  {L"\uFF11", false, 0}};  // full-width digit
+  } const ints[] = {{L"+42", true, 42},        {L" \t-17 \n", true, -17}, {L"-2147483648", true, -2147483647 - 1},
+                    {L"2147483648", false, 0}, {L"   ", false, 0},          {L"1.0", false, 0},
+                    {L"1 2", false, 0},        {L"+-1", false, 0},          {L"0x1F", false, 0},
+                    {L"\uFF11", false, 0}};  // full-width digit
   for (const auto& c : ints) {
     SCOPED_TRACE(CSvyString(c.text).ToNarrow());
     int value = kIntSentinel;
@@ -40,7 +41,7 @@ TEST(StringToNumber, ParsesWholeTextOrLeavesOutputAlone) {
     const wchar_t* text;
     bool ok;
     double value;
-  } const doubles[] = {{L"-.5", true, -0.5},    {L"2.", true, 2.0},    {L"  1.25E-2\t", true, 0.0125},
+  } const doubles[] = {{L"+1.5", true, 1.5}, {L"-.5", true, -0.5},  {L"2.", true, 2.0}, {L"  1.25E-2\t", true, 0.0125},
                        {L"1,5", false, 0},     {L"1.5.", false, 0},   {L".", false, 0},   {L"1e+", false, 0},
                        {L"inf", false, 0},     {L"nan", false, 0},    {L"0x1p3", false, 0}, {L"1e400", false, 0}};
   for (const auto& c : doubles) {

@@ -40,7 +40,7 @@ TEST(SvyStringCLocale, MapsEveryByteToTheSameCodePoint) {
 TEST(SvyStringSearch, FindsAndReportsMinusOne) {
   const CSvyString text(L"12+345.67+8");
   const int found[][2] = {{text.Find(L'+', 3), 9},     {text.Find(L'+', -1), -1},  {text.Find(L"45", 5), -1},
-                          {text.Find(L"", 11), 11},     {text.Find(L"x", 99), -1},  {text.ReverseFind(L'+'), 9},
+                          {text.Find(L"", 11), 11},     {text.Find(L"45"), 4},      {text.ReverseFind(L'+'), 9},
                           {text.FindOneOf(L".+"), 2},   {text.FindOneOf(L""), -1}};
   for (const auto& f : found) EXPECT_EQ(f[0], f[1]) << (&f - found);
 }
@@ -51,7 +51,8 @@ TEST(SvyStringSubstrings, ClampToTheText) {
     CSvyString actual;
     const wchar_t* expected;
   } const cases[] = {{text.Mid(-3, 2), L"ab"}, {text.Mid(4, 99), L"ef"}, {text.Mid(9), L""},
-                     {text.Mid(1, -1), L""},   {text.Left(99), L"abcdef"}, {text.Right(-1), L""}};
+                     {text.Mid(1, -1), L""},   {text.Left(99), L"abcdef"}, {text.Right(-1), L""},
+                     {text.Right(2), L"ef"}};
   for (const auto& c : cases) EXPECT_EQ(c.actual.str(), c.expected);
 }
 
@@ -59,6 +60,7 @@ TEST(SvyStringEditing, TrimsReplacesInsertsAndDeletes) {
   CSvyString text(L" \t 1,5 \r\n");
   EXPECT_EQ(CSvyString(text).TrimLeft().str(), L"1,5 \r\n");
   EXPECT_EQ(text.Trim().str(), L"1,5");
+  EXPECT_EQ(CSvyString(L"   ").Trim().str(), L"");
   EXPECT_EQ(CSvyString(L"xxabxx").TrimLeft(L'x').TrimRight(L"x").str(), L"ab");
 
   // Results in the order of the edits (a braced list is evaluated left to right). A replacement that
@@ -68,15 +70,17 @@ TEST(SvyStringEditing, TrimsReplacesInsertsAndDeletes) {
                             {grow.Replace(L"aa", nullptr), 3}, {grow.Replace(L"", L"x"), 0},
                             {edit.Insert(1, L'+'), 5},         {edit.Insert(99, L".00"), 8},
                             {edit.Insert(-5, L"-"), 9},        {edit.Delete(0), 8},
-                            {edit.Delete(5, 99), 5},           {edit.Remove(L'+'), 1}};
+                            {edit.Delete(5, 99), 5},           {edit.Delete(-1, 1), 5},
+                            {edit.Remove(L'+'), 1}};
   for (const auto& r : results) EXPECT_EQ(r[0], r[1]) << (&r - results);
   EXPECT_EQ(text.str(), L"1.5");
   EXPECT_EQ(grow.str(), L"--");
   EXPECT_EQ(edit.str(), L"1234");
+  edit.SetAt(0, L'9');
   edit.SetAt(4, L'x');
   edit.SetAt(-1, L'x');
-  EXPECT_EQ(edit.str(), L"1234");
-  EXPECT_EQ(edit.GetAt(4), L'\0');
+  EXPECT_EQ(edit.str(), L"9234");
+  EXPECT_TRUE(edit.GetAt(4) == L'\0' && edit[3] == L'4');
 }
 
 TEST(SvyStringCompare, OrdinalAndCaseFolded) {
@@ -97,6 +101,7 @@ TEST(SvyStringCompare, OrdinalAndCaseFolded) {
     EXPECT_EQ((noCase > 0) - (noCase < 0), c.noCase);
   }
   EXPECT_EQ(CSvyString(L"Ab\u00E9").MakeUpper().str(), L"AB\u00C9");
+  EXPECT_EQ(CSvyString(L"Ab\u00C9").MakeLower().str(), L"ab\u00E9");
 }
 
 TEST(SvyStringBuffer, WritesThroughAndSetsTheLength) {
@@ -136,6 +141,9 @@ TEST(SvyStringFormat, PrintfConversionsPositionalArgumentsAndLongOutput) {
 TEST(SvyStringOperators, ConcatenateAndCompare) {
   CSvyString text = CSvyString(L"1") + L"+" + CSvyString("234", svy_text::kCodePageUtf8) + L'.';
   EXPECT_TRUE((text += L"5") == L"1+234.5");
+  EXPECT_TRUE(text != CSvyString(L"1+234.50") && CSvyString(L"a") < CSvyString(L"b"));
+  EXPECT_EQ(CSvyString(L'-', 3).str(), L"---");
+  EXPECT_EQ(CSvyString(L"abcdef", 3).str(), L"abc");
   text = static_cast<const wchar_t*>(nullptr);
   EXPECT_TRUE(text.IsEmpty());
 }
