@@ -10,7 +10,7 @@ namespace {
 
 using svy_formats::RoundDouble;
 
-TEST(RoundDouble, AddsHalfAUnitWithTheSignOfX) {
+TEST(RoundDouble, AddsHalfAUnitWithTheSignOfXAndEndsOnExtremes) {
   struct {
     double x;
     int digits;
@@ -21,10 +21,7 @@ TEST(RoundDouble, AddsHalfAUnitWithTheSignOfX) {
     SCOPED_TRACE(::testing::Message() << c.x << " digits " << c.digits);
     EXPECT_NEAR(RoundDouble(c.x, c.digits), c.expected, 1e-15 * (1.0 + std::fabs(c.expected)));
   }
-}
-
-// The half unit formed by squaring agrees with the power function over the usable range of digits.
-TEST(RoundDouble, HalfUnitMatchesThePowerOfTen) {
+  // The half unit formed by squaring agrees with the power function over the usable range of digits.
   for (int digits = -20; digits <= 20; ++digits) {
     const double half = RoundDouble(1.0, digits) - 1.0;
     const double expected = 0.5 * std::pow(10.0, -digits);

@@ -44,20 +44,4 @@ TEST(RoundPrec, MatchesIntegerRoundingOfThousandths) {
   }
 }
 
-// Rounding is idempotent and never moves a value by more than half a unit of the kept decimal
-// (plus the representation error of the result).
-TEST(RoundPrec, IdempotentAndWithinHalfAUnit) {
-  std::mt19937_64 random(11);
-  std::uniform_real_distribution<double> value(-1e6, 1e6);
-  for (int i = 0; i < 5000; ++i) {
-    const double x = value(random);
-    for (int decimals = -3; decimals <= 9; decimals += 3) {
-      const double r = round_prec(x, decimals);
-      EXPECT_EQ(round_prec(r, decimals), r);
-      const double unit = std::pow(10.0, -decimals);
-      EXPECT_LE(std::fabs(r - x), 0.5 * unit + 1e-9 * std::fabs(x));
-    }
-  }
-}
-
 }  // namespace
