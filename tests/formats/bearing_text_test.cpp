@@ -20,6 +20,7 @@ TEST(DegreeToBearing, QuadrantLettersPaddedFieldsAndNonFiniteInput) {
   } const cases[] = {
       {0.0, 0, L"N 0\u00B000'00\" E"},    {90.0, 1, L"N 90\u00B000'00.0\" E"}, {180.0, 0, L"S 0\u00B000'00\" E"},
       {270.0, 0, L"N 90\u00B000'00\" W"}, {-45.0, 0, L"N 45\u00B000'00\" W"},  {405.0, 0, L"N 45\u00B000'00\" E"},
+      {135.5, 0, L"S 44\u00B030'00\" E"}, {192.0 + 5.0 / 60, 0, L"S 12\u00B005'00\" W"},
       {10.0 + 59.0 / 60 + 59.96 / 3600, 1, L"N 11\u00B000'00.0\" E"},  // carry
       {30.0, -2, L"N 30\u00B000'00\" E"}};
   for (const auto& c : cases) {

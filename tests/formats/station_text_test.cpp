@@ -19,6 +19,7 @@ TEST(StnToString, CountPlusUnpaddedRemainder) {
   } const cases[] = {{1005.3, 1000, L"1+5.30"},
                      {-1234.5, 1000, L"-1+-234.50"},  // both parts carry the sign
                      {999.999, 1000, L"0+1000.00"},   // no carry into the count
+                     {-234.5, 1000, L"0+-234.50"},    {-2000.0, 1000, L"-2+0.00"},
                      {12345.678, 100, L"123+45.68"},  {1234.5, -1000, L"-1+234.50"},
                      {2147483647000.0, 1000, L"2147483647+0.00"}};
   for (const auto& c : cases) {
