@@ -138,7 +138,7 @@ TEST(NoSolution, DisjointNestedConcentricAndInvalidInput) {
   struct {
     C2dPos p, q, center;
     double radius;
-  } const lines[] = {{a, a, kOrigin, 10.0}, {a, b, kOrigin, 0.0}, {a, b, kOrigin, kNaN},
+  } const lines[] = {{a, a, kOrigin, 10.0}, {a, b, kOrigin, 0.0}, {a, b, kOrigin, -10.0}, {a, b, kOrigin, kNaN},
                      {a, b, n, 10.0},       {n, b, kOrigin, 10.0}, {far, C2dPos(1e308, 1.0), C2dPos(-1e308, 0.0), 1.0}};
   for (const auto& c : lines) EXPECT_EQ(IntersectionCoordsOfLineAndCircle(c.p, c.q, c.center, c.radius, s1, s2), 0);
   const C2dPos north30(kGrid.north() + 30.0, kGrid.east()), north3(kGrid.north() + 3.0, kGrid.east());
@@ -150,7 +150,8 @@ TEST(NoSolution, DisjointNestedConcentricAndInvalidInput) {
   } const cases[] = {{kGrid, 10.0, north30, 10.0}, {kGrid, 50.0, north3, 10.0}, {kGrid, 50.0, kGrid, 20.0},
                      {kGrid, 50.0, kGrid, 50.0},
                      {kGrid, 50.0, C2dPos(kGrid.north() + 1e-9, kGrid.east()), 50.0},
-                     {kGrid, 10.0, kOrigin, -10.0}, {C2dPos(0.0, kNaN), 10.0, kOrigin, 10.0},
+                     {kGrid, 0.0, kOrigin, 10.0},   {kGrid, 10.0, kOrigin, -10.0}, {kGrid, kNaN, kOrigin, 10.0},
+                     {C2dPos(0.0, kNaN), 10.0, kOrigin, 10.0},
                      {C2dPos(-1e308, 0.0), 1e308, C2dPos(1e308, 0.0), 1e308}};
   for (const auto& c : cases) EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.c1, c.r1, c.c2, c.r2, s1, s2), 0);
   EXPECT_EQ(s1, C2dPos(-1, -1));
@@ -168,6 +169,7 @@ TEST(TwoCircles, NearlyConcentricCircles) {
     ASSERT_EQ(IntersectionCoordsOfTwoCircles(kOrigin, r1, center2, r2, s1, s2), 1);
     EXPECT_NEAR(dist(s1, kOrigin), r1, 1e-8);
     EXPECT_NEAR(dist(s1, center2), r2, 1e-8);
+    EXPECT_NEAR(s1.north(), 0.0, 1e-12);
     EXPECT_GT(s1.east() * (firstLarger ? 1.0 : -1.0), 0.0);
   }
   // Equal circles a little apart cross almost a diameter apart, across the centre line.

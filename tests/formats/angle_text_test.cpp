@@ -47,14 +47,16 @@ TEST(AngleTextReading, AcceptsTypedFormsAndLeavesFailuresAlone) {
     double degrees;
   } const cases[] = {
       {L"45\u00B030'15.25\"", true, false, false, kDms}, {L"45:30:15,25", true, false, false, kDms},
-      {L"45d30m15.25s", true, false, false, kDms}, {L" 45\u00B0 30\u2032 15.25\u2033 ", true, false, false, kDms},
+      {L"45d30m15.25s", true, false, false, kDms},
+      {L" 45\u00B0 30\u2032 15.25\u2033 ", true, false, false, kDms},
       {L"-12\u00B005'", true, true, false, -(12.0 + 5.0 / 60)}, {L"+12 5.5", true, true, false, 12.0 + 5.5 / 60},
       {L"45,5", true, true, true, 45.5},  {L".5", true, true, true, 0.5},
       // Rejected forms.
       {L"45.5\u00B030'", false, false, false, 0},  // decimals before the last field
       {L"45 30 60", false, false, false, 0},
       {L"45'", false, false, false, 0},  // a minute mark on the degrees
-      {L"45\u00B030\u00B0", false, false, false, 0}, {L"45 30 15 5", false, false, false, 0}, {L"1e3", false, false, false, 0}, {L"- 45", false, false, false, 0},
+      {L"45\u00B030\u00B0", false, false, false, 0}, {L"45 30 15 5", false, false, false, 0},
+      {L"1e3", false, false, false, 0},              {L"- 45", false, false, false, 0},
       {L"", false, false, false, 0}};
   for (const auto& c : cases) {
     SCOPED_TRACE(CSvyString(c.text).ToNarrow());
