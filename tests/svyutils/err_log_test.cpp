@@ -52,6 +52,9 @@ TEST(ErrLogSink, ReturnsThePreviousSinkSwallowsThrowsAndMayLog) {
   svy_err_log("chain", 3, "");
   svy_logging::setErrLogSink(original);
   EXPECT_EQ(lines, (std::vector<int>{3, 2, 1, 0}));
+  const CScopedErrLogCapture capture;  // the restored sink reaches captures again
+  svy_err_log("after", 9, "");
+  EXPECT_EQ(capture.count(), 1U);
 }
 
 // Entries from several threads all arrive, intact and in each thread's order; captures that begin and end
@@ -60,12 +63,15 @@ TEST(ErrLogCapture, CollectsEveryEntryFromSeveralThreadsAndSurvivesEndingCapture
   constexpr int kThreads = 6, kPerThread = 2000;
   {
     const CScopedErrLogCapture capture;
+    std::atomic<bool> go{false};
     std::vector<std::thread> loggers;
     for (int t = 0; t < kThreads; ++t)
-      loggers.emplace_back([t] {
+      loggers.emplace_back([t, &go] {
         const std::string file = "thread" + std::to_string(t);
+        while (!go.load()) std::this_thread::yield();
         for (int i = 0; i < kPerThread; ++i) svy_err_log(file.c_str(), i, "x");
       });
+    go = true;
     for (auto& logger : loggers) logger.join();
     const auto entries = capture.entries();
     ASSERT_EQ(entries.size(), static_cast<std::size_t>(kThreads * kPerThread));
