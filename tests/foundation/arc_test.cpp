@@ -113,11 +113,17 @@ TEST(ArcSetters, HalfAndFullCircles) {
   EXPECT_TRUE(arc.fullCircle);
   EXPECT_DOUBLE_EQ(arc.getSweep(), kTwoPi);
   EXPECT_NEAR(arc.getLength(), kTwoPi * 5, 1e-12);
+  EXPECT_EQ(arc.centralAngle.getRad(), 0);  // a full circle stores no central angle
+  CMathAngle az;
+  ASSERT_TRUE(arc.get_start_tgdir(az));
+  EXPECT_NEAR(az.getRad(), 0, 1e-12);
   ASSERT_TRUE(arc.get_middle_pos_on_the_arc(middle));
   expectSamePos(middle, C2dPos(10, 25), 1e-12, "opposite point");
   ASSERT_TRUE(arc.set_center_R_startAz_direction(C2dPos(10, 20), 5, radians(kPi / 2), false));
   expectSamePos(arc.start, C2dPos(5, 20), 1e-12, "counter-clockwise start lies south for an east tangent");
   EXPECT_DOUBLE_EQ(arc.getSweep(), -kTwoPi);
+  ASSERT_TRUE(arc.set_center_R(C2dPos(1, 2), 3));
+  EXPECT_TRUE(arc.fullCircle && std::fabs(arc.getRadius() - 3) < 1e-15);
   ASSERT_TRUE(arc.set_start_center_finish(C2dPos(0, 5), C2dPos(0, 0), C2dPos(0, 9), false));
   EXPECT_TRUE(arc.fullCircle);
   ASSERT_TRUE(arc.set_start_r_length(C2dPos(0, 0), radians(0), 2.0, kTwoPi * 2.0, true));
