@@ -1,5 +1,7 @@
 #include "svy_runner.h"
 
+#include <gtest/gtest.h>
+
 #include <fcntl.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -85,6 +87,26 @@ std::vector<std::string> splitCsvLine(const std::string& line) {
   while (std::getline(in, field, ',')) fields.push_back(field);
   if (!line.empty() && line.back() == ',') fields.emplace_back();
   return fields;
+}
+
+nlohmann::json runJson(const std::vector<std::string>& args, const std::string& stdinText) {
+  std::vector<std::string> all = {"--json", "--full-precision"};
+  all.insert(all.end(), args.begin(), args.end());
+  const SvyResult r = runSvy(all, stdinText);
+  EXPECT_EQ(r.exitStatus, 0) << r.err;
+  return nlohmann::json::parse(r.out, nullptr, false);
+}
+
+std::string csvRow(std::initializer_list<double> values) {
+  std::ostringstream row;
+  row.precision(17);
+  const char* separator = "";
+  for (double v : values) {
+    row << separator << v;
+    separator = ",";
+  }
+  row << '\n';
+  return row.str();
 }
 
 SvyResult runSvy(const std::vector<std::string>& args, const std::string& stdinText) {

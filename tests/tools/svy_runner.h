@@ -14,6 +14,9 @@
 // svy_test::examplesPath(). The binary's path comes from the build (SVY_TOOL_PATH), so the test always runs the
 // svy of its own build tree.
 
+#include <nlohmann/json.hpp>
+
+#include <initializer_list>
 #include <string>
 #include <vector>
 
@@ -39,6 +42,12 @@ std::string writeTempFile(const std::string& text, const std::string& suffix = "
 
 // Path of a file in the repository's examples/ folder.
 std::string examplesPath(const std::string& name);
+
+// Runs svy with --json --full-precision before the arguments, expects exit status 0 and parses its output.
+nlohmann::json runJson(const std::vector<std::string>& args, const std::string& stdinText = std::string());
+
+// One CSV input line of numbers written with 17 significant digits, ending in a newline.
+std::string csvRow(std::initializer_list<double> values);
 
 // Splits one CSV line at commas (no quoting), for checking output columns.
 std::vector<std::string> splitCsvLine(const std::string& line);

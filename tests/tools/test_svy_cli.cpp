@@ -1,8 +1,7 @@
-// The svy command as a whole: input sources, header lines, output forms, bad rows and usage errors.
+// The svy command as a whole: input sources, output forms, one bad row per verb family, usage errors.
 #include "svy_runner.h"
 
 #include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
 
 #include <string>
 #include <vector>
@@ -16,106 +15,124 @@ const std::string kInversePoints = "n1,e1,n2,e2\n0,0,3,4\n# a comment\n\n100,200
 
 TEST(SvyInput, FileAndStdinGiveTheSameRows) {
   const SvyResult fromStdin = runSvy({"cogo", "inverse"}, kInversePoints);
-  const SvyResult fromDash = runSvy({"cogo", "inverse", "-"}, kInversePoints);
-  const SvyResult fromFile = runSvy({"cogo", "inverse", svy_test::writeTempFile(kInversePoints)});
   EXPECT_EQ(fromStdin.exitStatus, 0) << fromStdin.err;
   EXPECT_EQ(fromStdin.lines().size(), 3u);
-  EXPECT_EQ(fromFile.exitStatus, 0) << fromFile.err;
-  EXPECT_EQ(fromFile.out, fromStdin.out);
-  EXPECT_EQ(fromDash.out, fromStdin.out);
-}
-
-TEST(SvyInput, MissingFileIsAUsageError) {
-  const SvyResult r = runSvy({"cogo", "inverse", "/nonexistent/points.csv"});
-  EXPECT_EQ(r.exitStatus, 2);
-  EXPECT_EQ(r.out, "");
-  ASSERT_EQ(r.errLines().size(), 1u);
-  EXPECT_EQ(r.errLines()[0].rfind("svy: cannot open '/nonexistent/points.csv'", 0), 0u) << r.err;
-}
-
-TEST(SvyInput, EmptyInputGivesHeaderOnly) {
+  EXPECT_EQ(runSvy({"cogo", "inverse", "-"}, kInversePoints).out, fromStdin.out);
+  EXPECT_EQ(runSvy({"cogo", "inverse", svy_test::writeTempFile(kInversePoints)}).out, fromStdin.out);
+  const SvyResult missing = runSvy({"cogo", "inverse", "/nonexistent/points.csv"});
+  EXPECT_EQ(missing.exitStatus, 2);
+  EXPECT_EQ(missing.err.rfind("svy: cannot open '/nonexistent/points.csv'", 0), 0u) << missing.err;
   EXPECT_EQ(runSvy({"cogo", "radiate"}, "").out, "n,e\n");
   EXPECT_EQ(runSvy({"--json", "cogo", "radiate"}, "# nothing\n").out, "[]\n");
 }
 
-TEST(SvyBadRows, ReportedWithLineNumbersWhileGoodRowsComeOut) {
-  const std::string input = "n1,e1,n2,e2\n0,0,3,4\n1,2,3\n\n0,0,x,4\n0,0,-3,-4\n";
-  const SvyResult r = runSvy({"cogo", "inverse"}, input);
-  EXPECT_EQ(r.exitStatus, 1);
-  const std::vector<std::string> out = r.lines();
-  ASSERT_EQ(out.size(), 3u) << r.out;
-  EXPECT_EQ(out[0], "azimuth_deg,azimuth_dms,distance");
-  EXPECT_EQ(svy_test::splitCsvLine(out[1]).back(), "5.0000");
-  EXPECT_EQ(svy_test::splitCsvLine(out[2]).front(), "233.13010235");
-  EXPECT_EQ(r.errLines(), (std::vector<std::string>{"svy: line 3: expected 4 numbers, got 3",
-                                                    "svy: line 5: n2: 'x' is not a number"}));
-}
-
-TEST(SvyBadRows, JsonStaysWellFormedAroundBadRows) {
-  const SvyResult r = runSvy({"--json", "cogo", "inverse"}, "0,0,3,4\nbad,row\n0,0,0,2\n");
-  EXPECT_EQ(r.exitStatus, 1);
-  const nlohmann::json rows = nlohmann::json::parse(r.out);
-  ASSERT_EQ(rows.size(), 2u);
-  EXPECT_EQ(rows[1]["distance"].get<double>(), 2.0);
-}
-
-TEST(SvyOutput, JsonObjectsKeyedByColumn) {
-  const SvyResult r = runSvy({"cogo", "inverse", "--json"}, kInversePoints);
-  ASSERT_EQ(r.exitStatus, 0) << r.err;
-  const nlohmann::json rows = nlohmann::json::parse(r.out);
-  ASSERT_TRUE(rows.is_array());
+TEST(SvyOutput, JsonObjectsKeyedByColumnAndWellFormedAroundBadRows) {
+  const nlohmann::json rows = nlohmann::json::parse(runSvy({"--json", "cogo", "inverse"}, kInversePoints).out);
   ASSERT_EQ(rows.size(), 2u);
   EXPECT_DOUBLE_EQ(rows[0]["distance"].get<double>(), 5.0);
-  EXPECT_DOUBLE_EQ(rows[0]["azimuth_deg"].get<double>(), 53.13010235);
   EXPECT_EQ(rows[1]["azimuth_dms"].get<std::string>(), "270\xC2\xB0" "0'0.00\"");
+  const SvyResult bad = runSvy({"--json", "cogo", "inverse"}, "0,0,3,4\nbad,row\n0,0,0,2\n");
+  EXPECT_EQ(bad.exitStatus, 1);
+  EXPECT_EQ(nlohmann::json::parse(bad.out).at(1)["distance"].get<double>(), 2.0);
 }
 
 TEST(SvyOutput, FullPrecisionReadsBackToTheSameDoubles) {
-  // Radiate a point, then feed the written coordinates to inverse: with 17 digits nothing is lost, so the
-  // distance comes back to the last bits.
   const SvyResult out = runSvy({"--full-precision", "cogo", "radiate"}, "1000.123,2000.456,37.5,123.456789\n");
   ASSERT_EQ(out.exitStatus, 0) << out.err;
-  const std::string point = out.lines().at(1);
-  const SvyResult back = runSvy({"--full-precision", "--json", "cogo", "inverse"}, "1000.123,2000.456," + point + "\n");
-  const nlohmann::json rows = nlohmann::json::parse(back.out);
-  EXPECT_NEAR(rows[0]["distance"].get<double>(), 123.456789, 1e-12);
-  EXPECT_NEAR(rows[0]["azimuth_deg"].get<double>(), 37.5, 1e-11);
-  // Fixed decimals lose digits instead.
+  const nlohmann::json back = svy_test::runJson({"cogo", "inverse"}, "1000.123,2000.456," + out.lines().at(1) + "\n");
+  EXPECT_NEAR(back[0]["distance"].get<double>(), 123.456789, 1e-12);
+  EXPECT_NEAR(back[0]["azimuth_deg"].get<double>(), 37.5, 1e-11);
   EXPECT_EQ(runSvy({"cogo", "radiate"}, "0,0,45,1\n").lines().at(1), "0.7071,0.7071");
 }
 
-struct UsageCase {
-  std::vector<std::string> args;
-  std::string message;
-};
-
-class SvyUsage : public ::testing::TestWithParam<UsageCase> {};
-
-TEST_P(SvyUsage, OneLineErrorAndNonZeroExit) {
-  const SvyResult r = runSvy(GetParam().args, "1\n");
-  EXPECT_EQ(r.exitStatus, 2);
-  EXPECT_EQ(r.out, "");
-  ASSERT_EQ(r.errLines().size(), 1u) << r.err;
-  EXPECT_NE(r.err.find(GetParam().message), std::string::npos) << r.err;
-  EXPECT_EQ(r.err.rfind("svy: ", 0), 0u) << r.err;
+// Per verb family: the header line, the same good row before and after two bad rows, the message for line 2.
+TEST(SvyBadRows, ReportedWithLineNumbersWhileGoodRowsComeOut) {
+  struct Case {
+    std::vector<std::string> args;
+    std::string input, header, message;
+  };
+  const Case cases[] = {
+      {{"cogo", "inverse"}, "0,0,3,4\n1,2,3\n", "azimuth_deg,azimuth_dms,distance", "expected 4 numbers, got 3"},
+      {{"cogo", "inverse"}, "0,0,3,4\n0,0,x,4\n", "azimuth_deg,azimuth_dms,distance", "n2: 'x' is not a number"},
+      {{"cogo", "inverse"}, "0,0,1,0\n0,0,1e308,1e308\n", "azimuth_deg,azimuth_dms,distance", ""},
+      {{"cogo", "radiate"}, "0,0,1,1\n0,0\n", "n,e", "expected 4 numbers, got 2"},
+      {{"angle", "convert", "--from", "deg", "--to", "rad"}, "1\nabc\n", "value", "value: 'abc' is not a number"},
+      {{"units", "convert", "--from", "m", "--to", "ft"}, "1\n1,2\n", "value", "expected 1 number, got 2"},
+      {{"station", "format", "--interval", "1"}, "5\n1e12\n", "chainage,text", ""},
+      {{"station", "parse", "--interval", "1000"}, "1+200\n+5\n", "text,chainage", "'+5' is not a station"},
+      {{"geo", "to-ecef"}, "10,20,30\n91,0,0\n", "x,y,z", "latitude must lie within -90 to 90 degrees"},
+      {{"geo", "to-geodetic"}, "6378137,0,0\n1,2\n", "lat_deg,lon_deg,h", "expected 3 numbers, got 2"},
+      {{"time", "to-gps"}, "2020-01-01T00:00:00\n2021-02-29T00:00:00\n", "week,seconds_of_week",
+       "no such date or time"},
+      {{"time", "to-gps"}, "2020-01-01T00:00:00\n2020-01-01T24:00:00\n", "week,seconds_of_week",
+       "no such date or time"},
+      {{"time", "to-gps"}, "2020-01-01T00:00:00\n1980-01-05T23:59:59.999\n", "week,seconds_of_week",
+       "times run from the GPS epoch"},
+      {{"time", "to-gps"}, "2020-01-01T00:00:00\n2100-01-01T00:00:00\n", "week,seconds_of_week",
+       "times run from the GPS epoch"},
+      {{"time", "to-gps"}, "2020-01-01T00:00:00\n2020-01-01T00:00:00.\n", "week,seconds_of_week",
+       "expected a time"},
+      {{"time", "from-gps"}, "2000,0\n1.5,0\n", "time,day_of_year", "the week must be a whole number"},
+      {{"time", "from-gps"}, "2000,0\n0,604800\n", "time,day_of_year", "seconds of week must lie in"},
+      {{"time", "from-gps"}, "2000,0\n6260,432000\n", "time,day_of_year", "times run to 2099-12-31"},
+  };
+  for (const Case& c : cases) {
+    SCOPED_TRACE(c.args[0] + " " + c.args[1] + ": " + c.input);
+    const SvyResult r = runSvy(c.args, c.input + "a,b,c,d,e,f,g\n" + c.input.substr(0, c.input.find('\n') + 1));
+    EXPECT_EQ(r.exitStatus, 1);
+    const std::vector<std::string> out = r.lines();
+    ASSERT_EQ(out.size(), 3u) << r.out;
+    EXPECT_EQ(out[0], c.header);
+    EXPECT_EQ(out[1], out[2]);
+    ASSERT_GE(r.errLines().size(), 2u) << r.err;
+    EXPECT_EQ(r.errLines()[0].rfind("svy: line 2: " + c.message, 0), 0u) << r.err;
+  }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Cases, SvyUsage,
-    ::testing::Values(UsageCase{{"angle", "convert", "--from", "deg", "--to", "degrees"}, "unknown unit 'degrees'"},
-                      UsageCase{{"units", "convert", "--from", "furlong", "--to", "m"}, "unknown unit 'furlong'"},
-                      UsageCase{{"units", "convert", "--from", "m", "--to", "m2"}, "cannot convert length (m)"},
-                      UsageCase{{"units", "convert", "--from", "C", "--to", "hPa"}, "to pressure (hPa)"},
-                      UsageCase{{"station", "format"}, "--interval"},
-                      UsageCase{{"station", "format", "--interval", "0"}, "--interval"},
-                      UsageCase{{"cogo", "inverse", "--bogus"}, "--bogus"}, UsageCase{{"nosuchfamily"}, "subcommand"},
-                      UsageCase{{}, "subcommand"}, UsageCase{{"cogo"}, "subcommand"}));
-
-TEST(SvyHelp, ListsTheFamiliesAndExitsZero) {
-  const SvyResult r = runSvy({"--help"});
-  EXPECT_EQ(r.exitStatus, 0);
-  for (const char* family : {"cogo", "angle", "station", "units"}) {
-    EXPECT_NE(r.out.find(family), std::string::npos) << family;
+TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
+  const std::vector<std::pair<std::vector<std::string>, std::string>> cases = {
+      {{"angle", "convert", "--from", "deg", "--to", "degrees"}, "unknown unit 'degrees'"},
+      {{"units", "convert", "--from", "furlong", "--to", "m"}, "unknown unit 'furlong'"},
+      {{"units", "convert", "--from", "m", "--to", "m2"}, "cannot convert length (m)"},
+      {{"units", "convert", "--from", "C", "--to", "hPa"}, "to pressure (hPa)"},
+      {{"station", "format"}, "--interval"},
+      {{"station", "format", "--interval", "0"}, "--interval"},
+      {{"cogo", "inverse", "--bogus"}, "--bogus"},
+      {{"nosuchfamily"}, "subcommand"},
+      {{}, "subcommand"},
+      {{"cogo"}, "subcommand"},
+      {{"geo", "enu"}, "--origin"},
+      {{"geo", "enu", "--origin", "55,5"}, "--origin"},
+      {{"geo", "enu", "--origin", "55,5,x"}, "--origin"},
+      {{"geo", "enu", "--origin", "95,5,0"}, "--origin"},
+      {{"fit", "radius"}, "center"},
+      {{"fit", "radius", "--center", "1;2"}, "--center"},
+      {{"curve", "solve", "--radius", "100"}, "give one more quantity"},
+      {{"curve", "solve", "--delta", "20"}, "give the radius"},
+      {{"curve", "solve", "--radius", "100", "--delta", "20", "--length", "5"}, "excludes"},
+      {{"curve", "solve", "--radius", "100", "--deg-arc", "3", "--delta", "20"}, "excludes"},
+      {{"curve", "solve", "--radius", "100", "--chord", "250"}, "no circular curve of radius 100 has chord 250"},
+      {{"curve", "solve", "--radius", "100", "--mid-ordinate", "250"}, "no circular curve"},
+      {{"curve", "solve", "--radius", "-5", "--delta", "20"}, "radius"},
+      {{"spiral", "table", "--type", "cubic", "--length", "100", "--radius", "100", "--interval", "10"},
+       "no cubic spiral"},
+      {{"spiral", "table", "--length", "100", "--radius", "300", "--interval", "1e-9"}, "interval"},
+      {{"spiral", "table", "--type", "bloss", "--length", "100", "--radius", "300", "--interval", "1"}, "bloss"},
+      {{"spiral", "table", "--length", "100", "--radius", "0", "--interval", "1"}, "radius"},
+  };
+  for (const auto& [args, message] : cases) {
+    SCOPED_TRACE(message);
+    const SvyResult r = runSvy(args, "1,2,3\n");
+    EXPECT_EQ(r.exitStatus, 2);
+    EXPECT_EQ(r.out, "");
+    EXPECT_EQ(r.errLines().size(), 1u) << r.err;
+    EXPECT_EQ(r.err.rfind("svy: ", 0), 0u) << r.err;
+    EXPECT_NE(r.err.find(message), std::string::npos) << r.err;
+  }
+  const SvyResult help = runSvy({"--help"});
+  EXPECT_EQ(help.exitStatus, 0);
+  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time"}) {
+    EXPECT_NE(help.out.find(family), std::string::npos) << family;
   }
 }
 
