@@ -10,7 +10,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
-#include <memory>
 #include <sstream>
 #include <stdexcept>
 
@@ -21,8 +20,7 @@ namespace {
 std::vector<std::string> splitLines(const std::string& text) {
   std::vector<std::string> lines;
   std::istringstream in(text);
-  std::string line;
-  while (std::getline(in, line)) lines.push_back(line);
+  for (std::string line; std::getline(in, line);) lines.push_back(line);
   return lines;
 }
 
@@ -39,35 +37,18 @@ std::string createTempFile(const std::string& text, const std::string& suffix) {
   std::string pattern = std::string(dir && *dir ? dir : "/tmp") + "/svy_test_XXXXXX" + suffix;
   const int fd = mkstemps(pattern.data(), static_cast<int>(suffix.size()));
   if (fd < 0) throw std::runtime_error("cannot create a temporary file");
-  std::size_t written = 0;
-  while (written < text.size()) {
-    const ssize_t n = ::write(fd, text.data() + written, text.size() - written);
-    if (n <= 0) break;
-    written += static_cast<std::size_t>(n);
-  }
   ::close(fd);
+  std::ofstream(pattern, std::ios::binary) << text;
   return pattern;
 }
 
 // Files handed out by writeTempFile(), removed when the test program exits.
-class TempFiles {
- public:
+struct TempFiles {
+  std::vector<std::string> paths;
   ~TempFiles() {
-    for (const std::string& path : paths_) std::remove(path.c_str());
+    for (const std::string& path : paths) std::remove(path.c_str());
   }
-  std::string create(const std::string& text, const std::string& suffix) {
-    paths_.push_back(createTempFile(text, suffix));
-    return paths_.back();
-  }
-
- private:
-  std::vector<std::string> paths_;
 };
-
-TempFiles& tempFiles() {
-  static TempFiles files;
-  return files;
-}
 
 }  // namespace
 
@@ -75,16 +56,17 @@ std::vector<std::string> SvyResult::lines() const { return splitLines(out); }
 std::vector<std::string> SvyResult::errLines() const { return splitLines(err); }
 
 std::string writeTempFile(const std::string& text, const std::string& suffix) {
-  return tempFiles().create(text, suffix);
+  static TempFiles files;
+  files.paths.push_back(createTempFile(text, suffix));
+  return files.paths.back();
 }
 
 std::string examplesPath(const std::string& name) { return std::string(SVY_EXAMPLES_DIR) + "/" + name; }
 
 std::vector<std::string> splitCsvLine(const std::string& line) {
   std::vector<std::string> fields;
-  std::string field;
   std::istringstream in(line);
-  while (std::getline(in, field, ',')) fields.push_back(field);
+  for (std::string field; std::getline(in, field, ',');) fields.push_back(field);
   if (!line.empty() && line.back() == ',') fields.emplace_back();
   return fields;
 }
@@ -111,12 +93,9 @@ std::string csvRow(std::initializer_list<double> values) {
 
 SvyResult runSvy(const std::vector<std::string>& args, const std::string& stdinText) {
   // The standard streams go through files: no pipe can fill up and block either side.
-  const std::string inPath = createTempFile(stdinText, ".in");
-  const std::string outPath = createTempFile("", ".out");
-  const std::string errPath = createTempFile("", ".err");
-
-  std::vector<std::string> argvText;
-  argvText.emplace_back(SVY_TOOL_PATH);
+  const std::string paths[] = {createTempFile(stdinText, ".in"), createTempFile("", ".out"),
+                               createTempFile("", ".err")};
+  std::vector<std::string> argvText = {SVY_TOOL_PATH};
   argvText.insert(argvText.end(), args.begin(), args.end());
   std::vector<char*> argv;
   for (std::string& a : argvText) argv.push_back(a.data());
@@ -124,34 +103,23 @@ SvyResult runSvy(const std::vector<std::string>& args, const std::string& stdinT
 
   SvyResult result;
   const pid_t pid = fork();
-  if (pid < 0) {
-    for (const std::string* path : {&inPath, &outPath, &errPath}) std::remove(path->c_str());
-    return result;
-  }
   if (pid == 0) {
-    const int in = ::open(inPath.c_str(), O_RDONLY);
-    const int out = ::open(outPath.c_str(), O_WRONLY | O_TRUNC);
-    const int err = ::open(errPath.c_str(), O_WRONLY | O_TRUNC);
-    if (in < 0 || out < 0 || err < 0) _exit(127);
-    ::dup2(in, STDIN_FILENO);
-    ::dup2(out, STDOUT_FILENO);
-    ::dup2(err, STDERR_FILENO);
+    const int flags[] = {O_RDONLY, O_WRONLY | O_TRUNC, O_WRONLY | O_TRUNC};
+    for (int stream = 0; stream < 3; ++stream) {
+      const int fd = ::open(paths[stream].c_str(), flags[stream]);
+      if (fd < 0 || ::dup2(fd, stream) < 0) _exit(127);  // stdin, stdout, stderr are 0, 1, 2
+    }
     ::execv(argv[0], argv.data());
     _exit(127);
   }
   int status = 0;
-  pid_t waited = -1;
-  do {
-    waited = ::waitpid(pid, &status, 0);
-  } while (waited < 0 && errno == EINTR);
-  if (WIFEXITED(status)) {
-    result.exitStatus = WEXITSTATUS(status);
-  } else if (WIFSIGNALED(status)) {
-    result.exitStatus = 128 + WTERMSIG(status);
+  while (pid > 0 && ::waitpid(pid, &status, 0) < 0 && errno == EINTR) {
   }
-  result.out = readWhole(outPath);
-  result.err = readWhole(errPath);
-  for (const std::string* path : {&inPath, &outPath, &errPath}) std::remove(path->c_str());
+  if (pid > 0 && WIFEXITED(status)) result.exitStatus = WEXITSTATUS(status);
+  if (pid > 0 && WIFSIGNALED(status)) result.exitStatus = 128 + WTERMSIG(status);
+  result.out = readWhole(paths[1]);
+  result.err = readWhole(paths[2]);
+  for (const std::string& path : paths) std::remove(path.c_str());
   return result;
 }
 
