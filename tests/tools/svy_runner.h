@@ -14,9 +14,8 @@
 // svy_test::examplesPath(). The binary's path comes from the build (SVY_TOOL_PATH), so the test always runs the
 // svy of its own build tree.
 
-#include <nlohmann/json.hpp>
-
 #include <initializer_list>
+#include <nlohmann/json.hpp>
 #include <string>
 #include <vector>
 

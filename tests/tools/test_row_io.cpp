@@ -1,8 +1,4 @@
 // The row reader and writer on string streams: number text, CSV fields, headers, comments, output forms.
-#include "row_io.h"
-
-#include "support/comma_locale.h"
-
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -13,6 +9,9 @@
 #include <utility>
 #include <vector>
 
+#include "row_io.h"
+#include "support/comma_locale.h"
+
 namespace {
 
 using svy_tool::Cell;
@@ -20,8 +19,8 @@ using svy_tool::InputRow;
 using svy_tool::RowFormat;
 
 TEST(NumberText, PlainDecimalsOnlyAndFullPrecisionReadsBack) {
-  const std::pair<const char*, double> good[] = {{"12.5", 12.5}, {" -0.25 ", -0.25}, {"+3", 3.0}, {".5", 0.5},
-                                                 {"1e3", 1000.0}, {"6378137", 6378137.0}};
+  const std::pair<const char*, double> good[] = {{"12.5", 12.5}, {" -0.25 ", -0.25}, {"+3", 3.0},
+                                                 {".5", 0.5},    {"1e3", 1000.0},    {"6378137", 6378137.0}};
   for (const auto& [text, expected] : good) {
     double value = 0.0;
     EXPECT_TRUE(svy_tool::parseNumber(text, value) && value == expected) << text;
@@ -35,9 +34,9 @@ TEST(NumberText, PlainDecimalsOnlyAndFullPrecisionReadsBack) {
     double back = 0.0;
     EXPECT_TRUE(svy_tool::parseNumber(svy_tool::formatNumber(v, -1), back) && back == v) << v;
   }
-  const std::tuple<double, int, const char*> fixed[] = {{1.23456, 3, "1.235"}, {-0.0001, 3, "0.000"}, {-0.0, 0, "0"},
-                                                        {-0.0006, 3, "-0.001"}, {std::nan(""), 3, "nan"},
-                                                        {-HUGE_VAL, 3, "-inf"}};
+  const std::tuple<double, int, const char*> fixed[] = {{1.23456, 3, "1.235"},    {-0.0001, 3, "0.000"},
+                                                        {-0.0, 0, "0"},           {-0.0006, 3, "-0.001"},
+                                                        {std::nan(""), 3, "nan"}, {-HUGE_VAL, 3, "-inf"}};
   for (const auto& [v, decimals, text] : fixed) EXPECT_EQ(svy_tool::formatNumber(v, decimals), text);
   std::vector<double> values;
   EXPECT_TRUE(svy_tool::parseNumberList("5000.5, -2000", 2, values));
@@ -78,10 +77,10 @@ TEST(RowReader, HeadersCommentsBlanksAndQuotes) {
     const char* rows;
   } cases[] = {
       {"# lot 7\nN,E\n\n 1 , 2 \r\n   # comment\n3,4\n", {"n", "e"}, true, "4:[1][2] 6:[3][4] "},
-      {"northing,easting\n1,2\n", {"n", "e"}, true, "2:[1][2] "},          // a line of names is a header
-      {"1O,2\n3,4\n", {"n", "e"}, true, "1:[1O][2] 2:[3][4] "},            // a mistyped number is data
-      {"1,2\nn,e\n", {"n", "e"}, true, "1:[1][2] 2:[n][e] "},              // only the first line can be one
-      {"1+200.00\n2+000\n", {"text"}, false, "1:[1+200.00] 2:[2+000] "},   // text input: header only by name
+      {"northing,easting\n1,2\n", {"n", "e"}, true, "2:[1][2] "},         // a line of names is a header
+      {"1O,2\n3,4\n", {"n", "e"}, true, "1:[1O][2] 2:[3][4] "},           // a mistyped number is data
+      {"1,2\nn,e\n", {"n", "e"}, true, "1:[1][2] 2:[n][e] "},             // only the first line can be one
+      {"1+200.00\n2+000\n", {"text"}, false, "1:[1+200.00] 2:[2+000] "},  // text input: header only by name
       {"TEXT\n1+200.00\n", {"text"}, false, "2:[1+200.00] "},
       {"\"12\"\"30'\", \"a,b\" ,c\n", {"x", "y", "z"}, false, "1:[12\"30'][a,b][c] "},
   };
@@ -113,18 +112,19 @@ TEST(RunRows, BadRowsReportedGoodRowsWritten) {
   RowFormat format{{"a", "b", "c"}, true, {{"twice", 1}}};
   format.requiredInputs = 1;
   testing::internal::CaptureStderr();
-  const int status = svy_tool::runRows(in, out, format, {}, [](const InputRow& row, std::vector<Cell>& cells,
-                                                                 std::string& error) {
-    if (row.numbers[0] < 0.0) {
-      error = "negative";
-      return false;
-    }
-    cells = {row.numbers[0] * 2.0 + static_cast<double>(row.numbers.size())};
-    return true;
-  });
-  EXPECT_EQ(testing::internal::GetCapturedStderr(), "svy: line 4: negative\n"
-                                                    "svy: line 5: a: 'abc' is not a number\n"
-                                                    "svy: line 7: expected 1 to 3 numbers, got 4\n");
+  const int status =
+      svy_tool::runRows(in, out, format, {}, [](const InputRow& row, std::vector<Cell>& cells, std::string& error) {
+        if (row.numbers[0] < 0.0) {
+          error = "negative";
+          return false;
+        }
+        cells = {row.numbers[0] * 2.0 + static_cast<double>(row.numbers.size())};
+        return true;
+      });
+  EXPECT_EQ(testing::internal::GetCapturedStderr(),
+            "svy: line 4: negative\n"
+            "svy: line 5: a: 'abc' is not a number\n"
+            "svy: line 7: expected 1 to 3 numbers, got 4\n");
   EXPECT_EQ(status, svy_tool::kExitBadRows);
   EXPECT_EQ(out.str(), "twice\n3.0\n6.0\n9.0\n");
 }

@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include <sstream>
 #include <string>
 #include <vector>
 
@@ -45,84 +46,71 @@ TEST(SvyOutput, FullPrecisionReadsBackToTheSameDoubles) {
   EXPECT_EQ(runSvy({"cogo", "radiate"}, "0,0,45,1\n").lines().at(1), "0.7071,0.7071");
 }
 
+std::vector<std::string> words(const std::string& text) {
+  std::istringstream in(text);
+  std::vector<std::string> all;
+  for (std::string word; in >> word;) all.push_back(word);
+  return all;
+}
+
 // Per verb family: the header line, the same good row before and after two bad rows, the message for line 2.
 TEST(SvyBadRows, ReportedWithLineNumbersWhileGoodRowsComeOut) {
-  struct Case {
-    std::vector<std::string> args;
-    std::string input, header, message;
+  const char* const toGps = "week,seconds_of_week";
+  const char* const cases[][4] = {
+      {"cogo inverse", "0,0,3,4\n1,2,3\n", "azimuth_deg,azimuth_dms,distance", "expected 4 numbers, got 3"},
+      {"cogo inverse", "0,0,3,4\n0,0,x,4\n", "azimuth_deg,azimuth_dms,distance", "n2: 'x' is not a number"},
+      {"cogo inverse", "0,0,1,0\n0,0,1e308,1e308\n", "azimuth_deg,azimuth_dms,distance", ""},
+      {"angle convert --from deg --to rad", "1\nabc\n", "value", "value: 'abc' is not a number"},
+      {"units convert --from m --to ft", "1\n1,2\n", "value", "expected 1 number, got 2"},
+      {"station format --interval 1", "5\n1e12\n", "chainage,text", ""},
+      {"station parse --interval 1000", "1+200\n+5\n", "text,chainage", "'+5' is not a station"},
+      {"geo to-ecef", "10,20,30\n91,0,0\n", "x,y,z", "latitude must lie within -90 to 90 degrees"},
+      {"time to-gps", "2020-01-01T00:00:00\n2021-02-29T00:00:00\n", toGps, "no such date or time"},
+      {"time to-gps", "2020-01-01T00:00:00\n1980-01-05T23:59:59.999\n", toGps, "times run from the GPS epoch"},
+      {"time to-gps", "2020-01-01T00:00:00\n2100-01-01T00:00:00\n", toGps, "times run from the GPS epoch"},
+      {"time to-gps", "2020-01-01T00:00:00\n2020-01-01T00:00:00.\n", toGps, "expected a time"},
+      {"time from-gps", "2000,0\n1.5,0\n", "time,day_of_year", "the week must be a whole number"},
+      {"time from-gps", "2000,0\n0,604800\n", "time,day_of_year", "seconds of week must lie in"},
+      {"time from-gps", "2000,0\n6260,432000\n", "time,day_of_year", "times run to 2099-12-31"},
   };
-  const Case cases[] = {
-      {{"cogo", "inverse"}, "0,0,3,4\n1,2,3\n", "azimuth_deg,azimuth_dms,distance", "expected 4 numbers, got 3"},
-      {{"cogo", "inverse"}, "0,0,3,4\n0,0,x,4\n", "azimuth_deg,azimuth_dms,distance", "n2: 'x' is not a number"},
-      {{"cogo", "inverse"}, "0,0,1,0\n0,0,1e308,1e308\n", "azimuth_deg,azimuth_dms,distance", ""},
-      {{"cogo", "radiate"}, "0,0,1,1\n0,0\n", "n,e", "expected 4 numbers, got 2"},
-      {{"angle", "convert", "--from", "deg", "--to", "rad"}, "1\nabc\n", "value", "value: 'abc' is not a number"},
-      {{"units", "convert", "--from", "m", "--to", "ft"}, "1\n1,2\n", "value", "expected 1 number, got 2"},
-      {{"station", "format", "--interval", "1"}, "5\n1e12\n", "chainage,text", ""},
-      {{"station", "parse", "--interval", "1000"}, "1+200\n+5\n", "text,chainage", "'+5' is not a station"},
-      {{"geo", "to-ecef"}, "10,20,30\n91,0,0\n", "x,y,z", "latitude must lie within -90 to 90 degrees"},
-      {{"geo", "to-geodetic"}, "6378137,0,0\n1,2\n", "lat_deg,lon_deg,h", "expected 3 numbers, got 2"},
-      {{"time", "to-gps"}, "2020-01-01T00:00:00\n2021-02-29T00:00:00\n", "week,seconds_of_week",
-       "no such date or time"},
-      {{"time", "to-gps"}, "2020-01-01T00:00:00\n2020-01-01T24:00:00\n", "week,seconds_of_week",
-       "no such date or time"},
-      {{"time", "to-gps"}, "2020-01-01T00:00:00\n1980-01-05T23:59:59.999\n", "week,seconds_of_week",
-       "times run from the GPS epoch"},
-      {{"time", "to-gps"}, "2020-01-01T00:00:00\n2100-01-01T00:00:00\n", "week,seconds_of_week",
-       "times run from the GPS epoch"},
-      {{"time", "to-gps"}, "2020-01-01T00:00:00\n2020-01-01T00:00:00.\n", "week,seconds_of_week",
-       "expected a time"},
-      {{"time", "from-gps"}, "2000,0\n1.5,0\n", "time,day_of_year", "the week must be a whole number"},
-      {{"time", "from-gps"}, "2000,0\n0,604800\n", "time,day_of_year", "seconds of week must lie in"},
-      {{"time", "from-gps"}, "2000,0\n6260,432000\n", "time,day_of_year", "times run to 2099-12-31"},
-  };
-  for (const Case& c : cases) {
-    SCOPED_TRACE(c.args[0] + " " + c.args[1] + ": " + c.input);
-    const SvyResult r = runSvy(c.args, c.input + "a,b,c,d,e,f,g\n" + c.input.substr(0, c.input.find('\n') + 1));
+  for (const auto& [args, input, header, message] : cases) {
+    SCOPED_TRACE(std::string(args) + ": " + input);
+    const std::string text = input;
+    const SvyResult r = runSvy(words(args), text + "a,b,c,d,e,f,g\n" + text.substr(0, text.find('\n') + 1));
     EXPECT_EQ(r.exitStatus, 1);
     const std::vector<std::string> out = r.lines();
     ASSERT_EQ(out.size(), 3u) << r.out;
-    EXPECT_EQ(out[0], c.header);
+    EXPECT_EQ(out[0], header);
     EXPECT_EQ(out[1], out[2]);
     ASSERT_GE(r.errLines().size(), 2u) << r.err;
-    EXPECT_EQ(r.errLines()[0].rfind("svy: line 2: " + c.message, 0), 0u) << r.err;
+    EXPECT_EQ(r.errLines()[0].rfind("svy: line 2: " + std::string(message), 0), 0u) << r.err;
   }
 }
 
 TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
-  const std::vector<std::pair<std::vector<std::string>, std::string>> cases = {
-      {{"angle", "convert", "--from", "deg", "--to", "degrees"}, "unknown unit 'degrees'"},
-      {{"units", "convert", "--from", "furlong", "--to", "m"}, "unknown unit 'furlong'"},
-      {{"units", "convert", "--from", "m", "--to", "m2"}, "cannot convert length (m)"},
-      {{"units", "convert", "--from", "C", "--to", "hPa"}, "to pressure (hPa)"},
-      {{"station", "format"}, "--interval"},
-      {{"station", "format", "--interval", "0"}, "--interval"},
-      {{"cogo", "inverse", "--bogus"}, "--bogus"},
-      {{"nosuchfamily"}, "subcommand"},
-      {{}, "subcommand"},
-      {{"cogo"}, "subcommand"},
-      {{"geo", "enu"}, "--origin"},
-      {{"geo", "enu", "--origin", "55,5"}, "--origin"},
-      {{"geo", "enu", "--origin", "55,5,x"}, "--origin"},
-      {{"geo", "enu", "--origin", "95,5,0"}, "--origin"},
-      {{"fit", "radius"}, "center"},
-      {{"fit", "radius", "--center", "1;2"}, "--center"},
-      {{"curve", "solve", "--radius", "100"}, "give one more quantity"},
-      {{"curve", "solve", "--delta", "20"}, "give the radius"},
-      {{"curve", "solve", "--radius", "100", "--delta", "20", "--length", "5"}, "excludes"},
-      {{"curve", "solve", "--radius", "100", "--deg-arc", "3", "--delta", "20"}, "excludes"},
-      {{"curve", "solve", "--radius", "100", "--chord", "250"}, "no circular curve of radius 100 has chord 250"},
-      {{"curve", "solve", "--radius", "100", "--mid-ordinate", "250"}, "no circular curve"},
-      {{"curve", "solve", "--radius", "-5", "--delta", "20"}, "radius"},
-      {{"spiral", "table", "--type", "cubic", "--length", "100", "--radius", "100", "--interval", "10"},
-       "no cubic spiral"},
-      {{"spiral", "table", "--length", "100", "--radius", "300", "--interval", "1e-9"}, "interval"},
-      {{"spiral", "table", "--type", "bloss", "--length", "100", "--radius", "300", "--interval", "1"}, "bloss"},
-      {{"spiral", "table", "--length", "100", "--radius", "0", "--interval", "1"}, "radius"},
+  const char* const cases[][2] = {
+      {"angle convert --from deg --to degrees", "unknown unit 'degrees'"},
+      {"units convert --from furlong --to m", "unknown unit 'furlong'"},
+      {"units convert --from m --to m2", "cannot convert length (m)"},
+      {"units convert --from C --to hPa", "to pressure (hPa)"},
+      {"station format", "--interval"}, {"station format --interval 0", "--interval"},
+      {"cogo inverse --bogus", "--bogus"}, {"nosuchfamily", "subcommand"}, {"", "subcommand"}, {"cogo", "subcommand"},
+      {"geo enu", "--origin"}, {"geo enu --origin 55,5", "--origin"}, {"geo enu --origin 55,5,x", "--origin"},
+      {"geo enu --origin 95,5,0", "--origin"}, {"fit radius", "center"}, {"fit radius --center 1;2", "--center"},
+      {"curve solve --radius 100", "give one more quantity"}, {"curve solve --delta 20", "give the radius"},
+      {"curve solve --radius 100 --delta 20 --length 5", "excludes"},
+      {"curve solve --radius 100 --deg-arc 3 --delta 20", "excludes"},
+      {"curve solve --radius 100 --chord 250", "no circular curve of radius 100 has chord 250"},
+      {"curve solve --radius 100 --mid-ordinate 250", "no circular curve"},
+      {"curve solve --radius -5 --delta 20", "radius"},
+      {"spiral table --type cubic --length 100 --radius 100 --interval 10", "no cubic spiral"},
+      {"spiral table --length 100 --radius 300 --interval 1e-9", "interval"},
+      {"spiral table --type bloss --length 100 --radius 300 --interval 1", "bloss"},
+      {"spiral table --length 100 --radius 0 --interval 1", "radius"},
   };
   for (const auto& [args, message] : cases) {
-    SCOPED_TRACE(message);
-    const SvyResult r = runSvy(args, "1,2,3\n");
+    SCOPED_TRACE(args);
+    const SvyResult r = runSvy(words(args), "1,2,3\n");
     EXPECT_EQ(r.exitStatus, 2);
     EXPECT_EQ(r.out, "");
     EXPECT_EQ(r.errLines().size(), 1u) << r.err;

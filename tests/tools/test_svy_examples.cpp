@@ -1,13 +1,12 @@
 // The sample data shipped in examples/ runs through its verbs without a bad row.
-#include "svy_runner.h"
-
-#include "svymath/foundation/constants.h"
-
 #include <gtest/gtest.h>
 
 #include <cmath>
 #include <string>
 #include <vector>
+
+#include "svy_runner.h"
+#include "svymath/foundation/constants.h"
 
 namespace {
 

@@ -24,7 +24,7 @@ TEST(AngleConvert, KnownValuesQuirksAndRoundTrips) {
       {"dms", "deg", "400.3000", 40.5},
   };
   for (const Case& c : cases) {
-    const nlohmann::json r = svy_test::runJson({"angle", "convert", "--from", c.from, "--to", c.to}, c.text + std::string("\n"));
+    const nlohmann::json r = svy_test::runJson({"angle", "convert", "--from", c.from, "--to", c.to}, c.text);
     EXPECT_NEAR(r.at(0).at("value").get<double>(), c.expected, 1e-11) << c.from << " -> " << c.to << ' ' << c.text;
   }
   // 12.9999999 degrees is 12 deg 59' 59.99964": rounded seconds stay below 60.
@@ -32,8 +32,9 @@ TEST(AngleConvert, KnownValuesQuirksAndRoundTrips) {
             "value\n12.59599996\n13.00000000\n");
   const double degrees[] = {0.5, 123.456789, -45.25, 359.9999};
   for (const char* unit : {"rad", "grad", "mil", "dms"}) {
-    const std::string there =
-        runSvy({"--full-precision", "angle", "convert", "--from", "deg", "--to", unit}, "0.5\n123.456789\n-45.25\n359.9999\n").out;
+    const std::string there = runSvy({"--full-precision", "angle", "convert", "--from", "deg", "--to", unit},
+                                     "0.5\n123.456789\n-45.25\n359.9999\n")
+                                  .out;
     const nlohmann::json back = svy_test::runJson({"angle", "convert", "--from", unit, "--to", "deg"}, there);
     ASSERT_EQ(back.size(), 4u) << unit;
     // The packed form keeps seconds to 8 decimals (3e-12 degree).

@@ -32,7 +32,7 @@ TEST(CurveSolve, EachQuantitySolvesBackToTheCurve) {
       const nlohmann::json back = solve({"--radius", "350", option, std::to_string(ref[quantity].get<double>())});
       // to_string keeps six decimals: the solved curve matches to that input precision.
       for (const auto& [column, value] : ref.items()) {
-        EXPECT_NEAR(back[column].get<double>(), value.get<double>(), 1e-3) << option << " delta " << delta << ' ' << column;
+        EXPECT_NEAR(back[column].get<double>(), value.get<double>(), 1e-3) << option << ' ' << delta << ' ' << column;
       }
     }
   }
@@ -41,7 +41,8 @@ TEST(CurveSolve, EachQuantitySolvesBackToTheCurve) {
 TEST(CurveSolve, CircleGeometryAndDegreeOfCurve) {
   const svy_test::SvyResult csv = runSvy({"curve", "solve", "--full-precision", "--radius", "100", "--delta", "90"});
   ASSERT_EQ(csv.lines().size(), 2u) << csv.err;
-  EXPECT_EQ(csv.lines()[0], "radius,deg_curve_arc,deg_curve_chord,delta_deg,length,chord,tangent,external,mid_ordinate");
+  EXPECT_EQ(csv.lines()[0],
+            "radius,deg_curve_arc,deg_curve_chord,delta_deg,length,chord,tangent,external,mid_ordinate");
   const std::vector<std::string> v = splitCsvLine(csv.lines()[1]);
   EXPECT_DOUBLE_EQ(std::stod(v.at(6)), GetTangentFromDelta(90.0, 100.0));
   EXPECT_NEAR(std::stod(v.at(4)), 50.0 * 3.141592653589793, 1e-12);
@@ -78,7 +79,8 @@ TEST(SpiralTable, RowsAgreeWithLibrary) {
     EXPECT_EQ(lines[0], "length,north,east,azimuth_deg,radius");
     // One row per whole interval, plus the start, plus the end when it is off the grid.
     const double whole = std::floor(c.length / c.interval + 1e-9);
-    EXPECT_EQ(lines.size(), static_cast<std::size_t>(whole) + (std::fabs(whole * c.interval - c.length) < 1e-9 ? 2 : 3));
+    const bool endOnGrid = std::fabs(whole * c.interval - c.length) < 1e-9;
+    EXPECT_EQ(lines.size(), static_cast<std::size_t>(whole) + (endOnGrid ? 2 : 3));
     CCurveDataSpiral1R spiral(std::string(c.type) == "cubic" ? eMathSpiralCubic : eMathSpiralEuler);
     ASSERT_TRUE(spiral.setLenAndR(c.length, c.radius, c.radius > 0.0, !c.exit));
     double previous = -1.0;

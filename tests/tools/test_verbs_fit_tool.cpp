@@ -1,12 +1,12 @@
 // svy fit line / circle / radius: fits of generated points at survey coordinates against closed forms and the
 // generating figures, and fits that give no result.
-#include "svy_runner.h"
-
 #include <gtest/gtest.h>
 
 #include <cmath>
 #include <string>
 #include <vector>
+
+#include "svy_runner.h"
 
 namespace {
 

@@ -1,11 +1,11 @@
 // svy geo to-ecef, to-geodetic and enu: published worked examples and the round trip between the first two.
-#include "svy_runner.h"
-
 #include <gtest/gtest.h>
 
 #include <cmath>
 #include <string>
 #include <vector>
+
+#include "svy_runner.h"
 
 namespace {
 
@@ -16,8 +16,8 @@ using svy_test::runJson;
 // about the origin 55 N, 5 E, 200 m to topocentric. The values are given to the millimetre on an ellipsoid
 // within 0.4 mm of the library's; azimuth and elevation follow from east, north, up and the distance.
 TEST(GeoVerbs, PublishedWorkedExamples) {
-  const nlohmann::json ecef =
-      runJson({"geo", "to-ecef"}, csvRow({53.0 + 48.0 / 60.0 + 33.820 / 3600.0, 2.0 + 7.0 / 60.0 + 46.380 / 3600.0, 73}));
+  const nlohmann::json ecef = runJson(
+      {"geo", "to-ecef"}, csvRow({53.0 + 48.0 / 60.0 + 33.820 / 3600.0, 2.0 + 7.0 / 60.0 + 46.380 / 3600.0, 73}));
   const double xyz[] = {3771793.968, 140253.342, 5124304.349};
   const char* axes[] = {"x", "y", "z"};
   for (int i = 0; i < 3; ++i) EXPECT_NEAR(ecef.at(0)[axes[i]].get<double>(), xyz[i], 1.5e-3) << axes[i];
@@ -27,8 +27,8 @@ TEST(GeoVerbs, PublishedWorkedExamples) {
   EXPECT_NEAR(east, -189013.869, 1.5e-3);
   EXPECT_NEAR(north, -128642.040, 1.5e-3);
   EXPECT_NEAR(up, -4220.171, 1.5e-3);
-  const double distance =
-      std::sqrt(std::pow(xyz[0] - 3652755.3058, 2) + std::pow(xyz[1] - 319574.6799, 2) + std::pow(xyz[2] - 5201547.3536, 2));
+  const double distance = std::sqrt(std::pow(xyz[0] - 3652755.3058, 2) + std::pow(xyz[1] - 319574.6799, 2) +
+                                    std::pow(xyz[2] - 5201547.3536, 2));
   EXPECT_NEAR(r["distance"].get<double>(), distance, 1.5e-3);
   EXPECT_NEAR(r["azimuth_deg"].get<double>(), 180.0 + std::atan2(-east, -north) * 180.0 / M_PI, 1e-9);
   EXPECT_NEAR(r["elevation_deg"].get<double>(), std::asin(up / distance) * 180.0 / M_PI, 1e-9);
@@ -44,7 +44,7 @@ TEST(GeoVerbs, PublishedWorkedExamples) {
 
 // Geodetic -> Cartesian -> geodetic through both verbs; longitudes come back in (-180, 180].
 TEST(GeoVerbs, RoundTripThroughBothVerbs) {
-  const std::vector<std::vector<double>> points = {{0, 0, 0},         {53.8, 2.13, 73},    {-33.86, 151.21, 58},
+  const std::vector<std::vector<double>> points = {{0, 0, 0},          {53.8, 2.13, 73},    {-33.86, 151.21, 58},
                                                    {40.7, -74.0, 10},  {-45, -179.9999, 5}, {12, 180, 100},
                                                    {89.9999, 45, 2e3}, {-89.5, -120, -400}, {27.98, 86.92, 8848.86},
                                                    {0, -90, 2.02e7},   {10, -180, 0}};

@@ -1,10 +1,10 @@
 // svy station format and parse: the station text with its sign and rounding quirks, and the round trip.
-#include "svy_runner.h"
-
 #include <gtest/gtest.h>
 
 #include <string>
 #include <vector>
+
+#include "svy_runner.h"
 
 namespace {
 
