@@ -13,46 +13,46 @@ namespace {
 
 using svy_logging::CScopedErrLogCapture;
 using svy_logging::svy_err_log;
+using svy_logging::TErrLogEntry;
 
-// Entries keep file, line and message (null texts become empty); a nested capture takes the entries
-// logged while it lives and then restores the outer one.
-TEST(ErrLogCapture, RecordsEntriesAndNestedCapturesRestoreTheOuterOne) {
-  const CScopedErrLogCapture outer;
-  svy_err_log("AreaMath", 7, "segment order");
+// Entries keep file, line and message (null texts become empty); a nested capture takes the entries logged
+// while it lives, then restores the outer one. Installing a sink returns the previous one; an empty sink
+// drops entries; a throwing sink does not reach the caller; a sink runs outside the log's lock, so it may
+// log again; a restored sink reaches captures again.
+TEST(ErrLog, CapturesNestAndSinksAreReplacedSwallowThrowsAndMayLog) {
   {
-    const CScopedErrLogCapture inner;
-    svy_err_log("inner", 2, "");
-    EXPECT_EQ(inner.count(), 1U);
+    const CScopedErrLogCapture outer;
+    svy_err_log("AreaMath", 7, "segment order");
+    {
+      const CScopedErrLogCapture inner;
+      svy_err_log("inner", 2, "");
+      EXPECT_EQ(inner.count(), 1U);
+    }
+    svy_err_log(nullptr, -1, nullptr);
+    const auto e = outer.entries();
+    ASSERT_EQ(e.size(), 2U);
+    EXPECT_TRUE(e[0].file == "AreaMath" && e[0].line == 7 && e[0].message == "segment order");
+    EXPECT_TRUE(e[1].file.empty() && e[1].line == -1 && e[1].message.empty());
   }
-  svy_err_log(nullptr, -1, nullptr);
-  const auto entries = outer.entries();
-  ASSERT_EQ(entries.size(), 2U);
-  EXPECT_TRUE(entries[0].file == "AreaMath" && entries[0].line == 7 && entries[0].message == "segment order");
-  EXPECT_TRUE(entries[1].file.empty() && entries[1].line == -1 && entries[1].message.empty());
-}
-
-// Installing a sink returns the previous one; an empty sink drops entries; a throwing sink does not reach
-// the caller; a sink is called outside the log's lock, so it may log again.
-TEST(ErrLogSink, ReturnsThePreviousSinkSwallowsThrowsAndMayLog) {
   int calls = 0;
-  const auto original = svy_logging::setErrLogSink([&calls](const svy_logging::TErrLogEntry&) { ++calls; });
+  const auto original = svy_logging::setErrLogSink([&calls](const TErrLogEntry&) { ++calls; });
   svy_err_log("formats", 1, "");
   auto mine = svy_logging::setErrLogSink({});
-  svy_err_log("formats", 2, "");  // no sink: dropped
+  svy_err_log("formats", 2, "");
   ASSERT_TRUE(static_cast<bool>(mine));
-  mine(svy_logging::TErrLogEntry{});
+  mine(TErrLogEntry{});
   EXPECT_EQ(calls, 2);
-  svy_logging::setErrLogSink([](const svy_logging::TErrLogEntry&) { throw std::runtime_error("sink"); });
+  svy_logging::setErrLogSink([](const TErrLogEntry&) { throw std::runtime_error("sink"); });
   EXPECT_NO_THROW(svy_err_log("mathAlnts", 5, ""));
   std::vector<int> lines;
-  svy_logging::setErrLogSink([&lines](const svy_logging::TErrLogEntry& entry) {
+  svy_logging::setErrLogSink([&lines](const TErrLogEntry& entry) {
     lines.push_back(entry.line);
     if (entry.line > 0) svy_err_log(entry.file.c_str(), entry.line - 1, "");
   });
   svy_err_log("chain", 3, "");
   svy_logging::setErrLogSink(original);
   EXPECT_EQ(lines, (std::vector<int>{3, 2, 1, 0}));
-  const CScopedErrLogCapture capture;  // the restored sink reaches captures again
+  const CScopedErrLogCapture capture;
   svy_err_log("after", 9, "");
   EXPECT_EQ(capture.count(), 1U);
 }
