@@ -21,9 +21,8 @@ TEST(GenericLine, ExtentByIntersectionType) {
     EIntersectionType type;
     double along;
     bool onLine;
-  } cases[] = {{eIntersectOnSegment, -0.0005, false},    {eIntersectOnSegmentTol, -0.0005, true},
-               {eIntersectUnbounded, -0.0005, true},     {eIntersectOnSegment, 0.0, true},
-               {eIntersectOnSegment, 100.0, true},       {eIntersectOnSegmentTol, 100.0009, true},
+  } cases[] = {{eIntersectOnSegment, -0.0005, false},    {eIntersectOnSegment, 100.0, true},
+               {eIntersectOnSegmentTol, -0.0005, true},  {eIntersectOnSegmentTol, 100.0009, true},
                {eIntersectOnSegmentTol, 100.0011, false}, {eIntersectOnSegmentTol, -0.002, false},
                {eIntersectUnbounded, -1e6, true},        {eIntersectUnbounded, 1e9, true}};
   for (const auto& c : cases) {
@@ -43,8 +42,7 @@ TEST(GenericLine, ExtentByIntersectionType) {
 TEST(GenericLine, PositionAndLengthOffsetRoundTrip) {
   const struct {
     double north, east, azDeg, length, offset;
-  } cases[] = {{0.0, 0.0, 0.0, 10.0, 2.5},           {0.0, 0.0, 90.0, 0.0, -4.0},
-               {10.0, -5.0, 180.0, 250.0, 1.0},      {0.0, 0.0, -90.0, 125.0, 0.0},
+  } cases[] = {{0.0, 0.0, 90.0, 0.0, -4.0}, {10.0, -5.0, 180.0, 250.0, 1.0},
                {5000000.0, 500000.0, 37.25, 77.7, -12.3}, {-300.0, 42.0, 271.5, 200.0, 1000.0}};
   for (const auto& c : cases) {
     SCOPED_TRACE(c.azDeg);
@@ -56,8 +54,7 @@ TEST(GenericLine, PositionAndLengthOffsetRoundTrip) {
                               c.east + c.length * std::sin(a) + c.offset * std::cos(a), 1e-8);
     double length = 0.0, offset = 0.0, distance = 0.0;
     ASSERT_TRUE(line.getLengthAndOffset(pos, length, offset));
-    EXPECT_NEAR(length, c.length, 1e-8);
-    EXPECT_NEAR(offset, c.offset, 1e-8);
+    curve_test::expectPosNear(C2dPos(length, offset), c.length, c.offset, 1e-8);
     ASSERT_TRUE(line.getShortestDistanceToPoint(pos, distance));
     EXPECT_NEAR(distance, std::fabs(c.offset), 1e-8);
   }
@@ -74,9 +71,7 @@ TEST(GenericLine, DefaultLengthExactZeroAndProlongedDistance) {
   EXPECT_NEAR(length, -5200.0, 1e-9);
   const CGenericLineImpl line(C2dPos(0.0, 0.0), C2dPos(100.0, 0.0));
   ASSERT_TRUE(line.getLengthAndOffset(C2dPos(1e-13, 5e-13), length, offset));
-  EXPECT_EQ(length, 0.0);
-  EXPECT_EQ(offset, 0.0);
-  EXPECT_FALSE(std::signbit(offset));
+  EXPECT_TRUE(length == 0.0 && offset == 0.0 && !std::signbit(offset));
   ASSERT_TRUE(line.getShortestDistanceToPoint(C2dPos(500.0, -3.0), distance));
   EXPECT_NEAR(distance, 3.0, 1e-12);  // not the 400.01 m to the end point
   EXPECT_FALSE(line.getLengthAndOffset(C2dPos(500.0, -3.0), length, offset));
@@ -120,11 +115,11 @@ TEST(SegmentElement, PlacedByOriginAndAzimuthOrUnplaced) {
   EXPECT_FALSE(unplaced.getPosAtLength(0.0, pos));
   EXPECT_EQ(pos, C2dPos(995.0, 2040.0));
   unplaced.setStartValues(1.0, 2.0, CMathAngle(0.0));
-  EXPECT_FALSE(unplaced.isok());  // placed, but the data is still undefined
+  const bool placedWithoutData = unplaced.isok();
   unplaced.setCurve(data);
-  EXPECT_TRUE(unplaced.isok());
+  const bool complete = unplaced.isok();
   unplaced.resetOrgAz();
-  EXPECT_FALSE(unplaced.isok());
+  EXPECT_TRUE(!placedWithoutData && complete && !unplaced.isok());
 }
 
 TEST(TLine, AzimuthAndLengthFormMatchesTwoPointFormAndEmptyLineGivesNothing) {
@@ -136,8 +131,7 @@ TEST(TLine, AzimuthAndLengthFormMatchesTwoPointFormAndEmptyLineGivesNothing) {
   ASSERT_TRUE(fromAzimuth.getPosAtLengthAndOffset(20.0, -3.0, n1, e1));
   ASSERT_TRUE(fromPoints.getPosAtLengthAndOffset(20.0, -3.0, n2, e2));
   curve_test::expectPosNear(C2dPos(n1, e1), n2, e2, 1e-12);
-  EXPECT_FALSE(TLine().isok());
-  EXPECT_FALSE(TLine().getPosAtLength(1.0, n1, e1));
+  EXPECT_FALSE(TLine().isok() || TLine().getPosAtLength(1.0, n1, e1));
   EXPECT_EQ(n1, n2);  // untouched
 }
 
@@ -168,8 +162,7 @@ TEST(SegmentRtti, CastFollowsTheHierarchyAndClonesKeepTheirKind) {
   arc.setIntersectionType(eIntersectUnbounded);
   const std::unique_ptr<CGenericSegment> arcCopy(arc.clone());
   ASSERT_NE(CCurveArc::cast(arcCopy.get()), nullptr);
-  EXPECT_EQ(arcCopy->getIntersectionType(), eIntersectUnbounded);
-  EXPECT_EQ(arcCopy->getEndPos(), arc.getEndPos());
+  EXPECT_TRUE(arcCopy->getIntersectionType() == eIntersectUnbounded && arcCopy->getEndPos() == arc.getEndPos());
   const std::unique_ptr<CGenericSegment> spiralCopy(
       curve_test::makeSpiral(1.0, 2.0, 3.0, 60.0, 300.0, true, false).clone());
   ASSERT_NE(CCurveSpiral::cast(spiralCopy.get()), nullptr);
