@@ -29,21 +29,17 @@ SVY_RTTI_DEFINE(CUnrelated, CRttiBase)
 
 using namespace rtti_test;
 
-// The id is the address of the name literal (an equal string elsewhere is not the id).
-TEST(RunTimeTypeIdentity, IdIsTheAddressOfTheNameLiteral) {
-  EXPECT_EQ(CCircleShape::static_rtti_id(), static_cast<const void*>(CCircleShape::static_rtti_name()));
+// The id is the address of the name literal (an equal string elsewhere is not the id); cast adjusts the
+// pointer across both bases and refuses unrelated classes, null, and a base that is not the derived class.
+TEST(RunTimeTypeIdentity, IdIsTheNameLiteralAndCastAdjustsAcrossBothBases) {
   static const char copy[] = "CCircleShape";
+  EXPECT_EQ(CCircleShape::static_rtti_id(), static_cast<const void*>(CCircleShape::static_rtti_name()));
   EXPECT_NE(static_cast<const void*>(copy), CCircleShape::static_rtti_id());
   EXPECT_NE(CShapeBase::static_rtti_id(), CShapeImpl::static_rtti_id());
   CCircleShape circle;
-  const CRttiBase& root = circle;
-  EXPECT_EQ(root.get_rtti_id(), CCircleShape::static_rtti_id());
-  EXPECT_STREQ(root.get_rtti_name(), "CCircleShape");
-}
-
-TEST(RunTimeTypeIdentity, CastAdjustsThePointerAcrossBothBases) {
-  CCircleShape circle;
   CRttiBase* root = static_cast<CShapeBase*>(&circle);
+  EXPECT_EQ(root->get_rtti_id(), CCircleShape::static_rtti_id());
+  EXPECT_STREQ(root->get_rtti_name(), "CCircleShape");
   EXPECT_EQ(CCircleShape::cast(root), &circle);
   EXPECT_EQ(CShapeBase::cast(root), static_cast<CShapeBase*>(&circle));
   CShapeImpl* impl = CShapeImpl::cast(root);
@@ -54,6 +50,6 @@ TEST(RunTimeTypeIdentity, CastAdjustsThePointerAcrossBothBases) {
   const CRttiBase* constRoot = root;
   EXPECT_EQ(CCircleShape::cast(constRoot), &circle);
   EXPECT_TRUE(constRoot->is_rtti_type(CRttiBase::static_rtti_id()));
-  CShapeImpl alone;  // a base is not its derived class
+  CShapeImpl alone;
   EXPECT_EQ(CCircleShape::cast(&alone), nullptr);
 }
