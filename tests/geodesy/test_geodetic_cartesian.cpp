@@ -1,20 +1,22 @@
 #include <gtest/gtest.h>
 
 #include <GeographicLib/Geocentric.hpp>
+#include <GeographicLib/LocalCartesian.hpp>
 #include <algorithm>
 #include <cmath>
 #include <limits>
 
-#include "geodesy/csv_table.h"
-#include "support/refdata.h"
 #include "svymath/foundation/constants.h"
 #include "svymath/geodesy/ellipsoid.h"
 #include "svymath/geodesy/geo_coord.h"
+#include "svymath/geodesy/local_frame.h"
 
 namespace {
 
 using svy_math::units::kDegToRad;
 using svy_math::units::kHalfPi;
+using svy_math::units::kTwoPi;
+using Vec3 = svy_math::TAbstractPoint3<double>;
 
 // Forward: both sides evaluate closed formulas, a few ulps of 2.6e7 m. Reverse (as a distance): the latitude
 // iteration stops on a change of 1e-10 in tan(B) and contracts by ~e^2 per step, which leaves up to
@@ -34,12 +36,17 @@ GeoCoord toGeodetic(const Coord& c) {
 
 double distance(const Coord& p, const Coord& q) { return (p - q).Module(); }
 
+const GeographicLib::Geocentric& independentEarth() {
+  static const GeographicLib::Geocentric earth(svy_math::ellipsoidParams().a,
+                                               1.0 - std::sqrt(1.0 - svy_math::ellipsoidParams().e2));
+  return earth;
+}
+
 // Over a global grid (poles, 1e-7 deg from them, both sides of the antimeridian, heights from below sea
 // level to GNSS orbit): forward against the independent library, and reverse judged by where the result
 // lies, which stays meaningful at the poles where the longitude is arbitrary.
 TEST(GeodeticCartesian, MatchesIndependentLibraryOverGlobalGrid) {
-  const svy_math::TEllipsoidParams& ell = svy_math::ellipsoidParams();
-  const GeographicLib::Geocentric earth(ell.a, 1.0 - std::sqrt(1.0 - ell.e2));
+  const GeographicLib::Geocentric& earth = independentEarth();
   for (int i = -13; i <= 13; ++i) {
     const double lat = i == 13 ? 89.9999999 : i == -13 ? -90.0 : 7.5 * i;
     for (int j = -13; j <= 12; ++j) {
@@ -56,29 +63,6 @@ TEST(GeodeticCartesian, MatchesIndependentLibraryOverGlobalGrid) {
       }
     }
   }
-}
-
-// 516 points computed independently for the stored eccentricity, and for the usual flattening: the stored
-// e (kept as the decimal, not derived from 1/f) puts results up to 0.4 mm from the usual ellipsoid. The
-// table stays in the shared reference folder, so this runs only where that folder is present.
-TEST(GeodeticCartesian, MatchesReferenceTableForTheStoredEccentricity) {
-  SVY_SKIP_WITHOUT_REFDATA();
-  const svy_test::CsvColumns t =
-      svy_test::readCsvColumns(svy_test::refdataPath("geodetic/geodetic_ecef_cartconvert.csv"));
-  ASSERT_EQ(t.at("lat_deg").size(), 516u);
-  double largestEllipsoidDifference = 0.0;
-  for (std::size_t r = 0; r < 516; ++r) {
-    const auto at = [&t, r](const std::string& x) {
-      return Coord(t.at("X_" + x)[r], t.at("Y_" + x)[r], t.at("Z_" + x)[r]);
-    };
-    const Coord expected = at("e0818191913305"),
-                c = toCartesian(t.at("lat_deg")[r], t.at("lon_deg")[r], t.at("h_m")[r]);
-    ASSERT_LT(distance(c, expected), kForwardTol) << t.at("lat_deg")[r] << " " << t.at("lon_deg")[r];
-    ASSERT_LT(distance(toCartesian(0, 0, 0).blh2xyz(toGeodetic(expected)), expected), kReverseTol);
-    largestEllipsoidDifference = std::max(largestEllipsoidDifference, distance(c, at("wgs84")));
-  }
-  EXPECT_GT(largestEllipsoidDifference, 1e-4);
-  EXPECT_LT(largestEllipsoidDifference, 5e-4);
 }
 
 // The equator on the prime meridian (exactly on the X axis both ways); the centre of the earth (h = -a); the
@@ -116,6 +100,59 @@ TEST(GeodeticCartesian, NonFiniteAndAbsurdInputEnds) {
   const GeoCoord steep = toGeodetic(Coord(2e-10, 0.0, 1e300));
   EXPECT_TRUE(std::isnan(steep.lat()) || std::fabs(steep.lat()) <= kHalfPi);
   EXPECT_LT(std::fabs(toGeodetic(Coord(42697.673, 0.0, 6.9e-6)).lat()), 0.01);
+}
+
+// (east, north, up) of Cartesian differences against an independent local Cartesian frame, at origins that
+// include both poles, the antimeridian and the equator, for targets near and far (a rotation of a vector of
+// up to 2.6e7 m: a few ulps).
+TEST(LocalFrame, MatchesIndependentLocalCartesian) {
+  const double origins[][3] = {
+      {0.0, 0.0, 0.0},      {53.8, 2.13, 73.0}, {-33.9, 151.2, 40.0},        {90.0, 0.0, 0.0},
+      {-90.0, 30.0, 100.0}, {12.5, 180.0, 0.0}, {-45.0, -179.9999999, 10.0}, {89.9999999, -75.0, 3000.0}};
+  for (const auto& o : origins) {
+    const GeographicLib::LocalCartesian frame(o[0], o[1], o[2], independentEarth());
+    const Coord origin = toCartesian(o[0], o[1], o[2]);
+    for (double dLat : {-30.0, -0.001, 0.0, 2.0})
+      for (double dLon : {-90.0, 0.0, 0.00002, 45.0})
+        for (double h : {-50.0, 1500.0, 2.02e7}) {
+          const double lat = std::max(-90.0, std::min(90.0, o[0] + dLat)), lon = o[1] + dLon;
+          double enu[3] = {0, 0, 0};
+          frame.Forward(lat, lon, h, enu[0], enu[1], enu[2]);
+          const Vec3 local =
+              blh_to_neu(Vec3(o[0] * kDegToRad, o[1] * kDegToRad, o[2]), toCartesian(lat, lon, h) - origin);
+          for (int k = 0; k < 3; ++k)
+            ASSERT_NEAR(local[k], enu[k], 1e-7) << o[0] << " " << o[1] << ": " << lat << " " << lon << " " << h;
+        }
+  }
+}
+
+// Polar form (elevation, azimuth clockwise from north in [0, 2 pi), slope distance) of the vector built from
+// it. A vector without direction (horizontal length squared and up both inside +-1e-12, so anything up to
+// 1e-6 m across with no height) gives the largest double for both angles and a zero distance.
+TEST(LocalPolar, RecoversAzimuthElevationAndDistance) {
+  const double cases[][3] = {{0.0, 0.0, 100.0},  {90.0, 10.0, 25.0}, {180.0, -5.0, 1000.0},
+                             {270.0, 45.0, 3.5}, {-0.5, 1.0, 2.0e7}, {359.9999, -89.0, 0.01},
+                             {0.0, 90.0, 12.0},  {0.0, -90.0, 12.0}, {123.456, 0.0, 1e-5}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(::testing::Message() << c[0] << " " << c[1] << " " << c[2]);
+    const double az = c[0] * kDegToRad, el = c[1] * kDegToRad;
+    const Vec3 polar =
+        neu_to_polar(Vec3(c[2] * std::cos(el) * std::sin(az), c[2] * std::cos(el) * std::cos(az), c[2] * std::sin(el)));
+    EXPECT_NEAR(polar[0], el, 1e-14);
+    if (std::fabs(c[1]) < 90.0) {
+      EXPECT_NEAR(polar[1], std::fmod(az + kTwoPi, kTwoPi), 1e-14);
+    }
+    EXPECT_TRUE(polar[1] >= 0.0 && polar[1] < kTwoPi) << polar[1];
+    EXPECT_NEAR(polar[2], c[2], 1e-9 * c[2]);
+  }
+  const double kMax = std::numeric_limits<double>::max();
+  for (const Vec3& v : {Vec3(0.0, 0.0, 0.0), Vec3(5e-7, -5e-7, 0.0), Vec3(0.0, 0.0, -9e-13)}) {
+    const Vec3 polar = neu_to_polar(v);
+    EXPECT_TRUE(polar[0] == kMax && polar[1] == kMax && polar[2] == 0.0) << v[0] << " " << v[2];
+  }
+  const Vec3 justAbove = neu_to_polar(Vec3(1.1e-6, 0.0, 0.0));
+  EXPECT_EQ(justAbove[1], svy_math::units::kPi / 2);
+  EXPECT_NEAR(justAbove[2], 1.1e-6, 1e-20);
 }
 
 }  // namespace
