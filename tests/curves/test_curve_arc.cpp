@@ -114,7 +114,9 @@ TEST(ArcElement, RoundTripProjectionAndBoxAgainstSampling) {
     double length = -1.0, offset = -1.0, dist = 0.0, len = 0.0;
     ASSERT_TRUE(arc.getLengthAndOffset(pos, length, offset));
     ASSERT_TRUE(arc.getShortestDistAndCurveLen(pos.north(), pos.east(), dist, len));
-    for (const auto& got : {C2dPos(length, offset), C2dPos(len, dist)}) curve_test::expectPosNear(got, c.at, c.offset, 1e-8);
+    for (const C2dPos& got : {C2dPos(length, offset), C2dPos(len, dist)}) {
+      curve_test::expectPosNear(got, c.at, c.offset, 1e-8);
+    }
     for (double n = 750.0; n <= 1250.0; n += 83.0) {
       for (double e = -2250.0; e <= -1750.0; e += 71.0) {
         ASSERT_TRUE(arc.getShortestDistAndCurveLen(n, e, dist, len));

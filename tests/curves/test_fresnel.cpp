@@ -57,7 +57,7 @@ TEST(Fresnel, OddFunctionsWithHalfLimitsContinuousAtTheSwitch) {
   }
   const struct {
     double t, expected, tol;
-  } limits[] = {{1e6, 0.5, 1e-6}, {-std::numeric_limits<double>::infinity(), -0.5, 0.0}, {0.0, 0.0, 0.0}, {kNaN, kNaN, 0}};
+  } limits[] = {{1e6, 0.5, 1e-6}, {-curve_test::kInf, -0.5, 0.0}, {0.0, 0.0, 0.0}, {kNaN, kNaN, 0.0}};
   for (const auto& l : limits) {
     fresnelCS(l.t, S, C);
     EXPECT_TRUE(std::isnan(l.expected) ? std::isnan(S) && std::isnan(C)
