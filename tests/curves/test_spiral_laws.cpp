@@ -27,27 +27,26 @@ TEST(Clothoid, MatchesIntegratedHeadingAndUnitClothoidTable) {
   const struct {
     double length, radius;
     bool right;
-  } cases[] = {{100.0, 300.0, true}, {100.0, 300.0, false}, {60.0, 1000.0, true},
-               {250.0, 120.0, true}, {500.0, 60.0, false},  {5.0, 25.0, true}};
+  } cases[] = {{100.0, 300.0, true}, {250.0, 120.0, true}, {500.0, 60.0, false}};
   for (const auto& c : cases) {
     SCOPED_TRACE(c.length);
     CEulerSpiralTStoSC law;
     ASSERT_TRUE(law.setLenAndR(c.length, c.radius, c.right));
     const double signedR = c.right ? c.radius : -c.radius;
     auto heading = [&](double u) { return u * u / (2.0 * signedR * c.length); };  // integral of s / (R L)
-    for (double f : {0.1, 0.37, 0.81, 1.0}) {
+    for (double f : {0.37, 1.0}) {
       const double s = f * c.length;
       double n = 0.0, e = 0.0, refN = 0.0, refE = 0.0;
       ASSERT_TRUE(law.getPosAtLength(s, n, e));
       curve_test::integrateHeading(heading, s, 1e-12, refN, refE);
-      EXPECT_NEAR(n, refN, 1e-9) << s;
-      EXPECT_NEAR(e, refE, 1e-9) << s;
+      curve_test::expectPosNear(C2dPos(n, e), refN, refE, 1e-9);
       EXPECT_NEAR(law.GetAzimuth(s) * kDegToRad, heading(s), 1e-12 * kDegToRad);
       EXPECT_NEAR(law.getCurvatureAtLength(s), s / (signedR * c.length), 1e-15);
     }
     // The stored angle is reduced to [-pi, pi] (the 500 m case turns beyond a half turn): compare directions.
-    EXPECT_NEAR(law.getSpiralAngle().getSin(), std::sin(c.length / (2.0 * signedR)), 1e-15);
-    EXPECT_NEAR(law.getSpiralAngle().getCos(), std::cos(c.length / (2.0 * signedR)), 1e-15);
+    const CMathAngle angle = law.getSpiralAngle();
+    curve_test::expectPosNear(C2dPos(angle.getSin(), angle.getCos()), std::sin(c.length / (2.0 * signedR)),
+                              std::cos(c.length / (2.0 * signedR)), 1e-15);
   }
   const auto rows = curve_test::readNumericTable(svy_test::testdataPath("curves/unit_clothoid_A1_table.csv"));
   ASSERT_GT(rows.size(), 100u);
@@ -56,8 +55,7 @@ TEST(Clothoid, MatchesIntegratedHeadingAndUnitClothoidTable) {
   for (const auto& row : rows) {
     double n = 0.0, e = 0.0;
     ASSERT_TRUE(law.getPosAtLength(200.0 * row[0], n, e));
-    EXPECT_NEAR(n, 200.0 * row[2], 2e-9) << row[0];
-    EXPECT_NEAR(e, 200.0 * row[3], 2e-9) << row[0];
+    curve_test::expectPosNear(C2dPos(n, e), 200.0 * row[2], 200.0 * row[3], 2e-9);
     EXPECT_NEAR(law.GetAzimuth(200.0 * row[0]) * kDegToRad, row[1], 1e-13);
   }
 }
@@ -79,11 +77,9 @@ TEST(Clothoid, LengthAtAzimuthAndSpiralParameterQuirk) {
   EXPECT_NEAR(law.getSpiralAngle().getRad(), 100.0 * 100.0 / 60000.0, 1e-15);
   for (double s : {0.0, 50.0, 100.0}) {
     double n = 1.0, e = 1.0;
-    ASSERT_TRUE(law.getPosAtLength(s, n, e));
-    EXPECT_EQ(C2dPos(n, e), C2dPos(0.0, 0.0));
+    EXPECT_TRUE(law.getPosAtLength(s, n, e) && n == 0.0 && e == 0.0 && law.GetAzimuth(s) == 0.0 &&
+                law.getCurvatureAtLength(s) == 0.0);
   }
-  EXPECT_EQ(law.GetAzimuth(50.0), 0.0);
-  EXPECT_EQ(law.getCurvatureAtLength(50.0), 0.0);
   ASSERT_TRUE(law.setLenAndSpPrm(0.0, 30000.0));
   EXPECT_TRUE(std::isinf(law.getRadius()));
 }
@@ -110,8 +106,7 @@ TEST(CubicParabola, MatchesExactArcLengthTable) {
     double n = 0.0, e = 0.0;
     ASSERT_TRUE(law.getPosAtLength(s, n, e));
     SCOPED_TRACE("L " + std::to_string(row[kL]) + " R " + std::to_string(row[kR]) + " s " + std::to_string(s));
-    EXPECT_NEAR(n, row[kX], tol(row[kX]));
-    EXPECT_NEAR(e, row[kY], tol(row[kY]));
+    EXPECT_TRUE(std::fabs(n - row[kX]) <= tol(row[kX]) && std::fabs(e - row[kY]) <= tol(row[kY])) << n << " " << e;
     EXPECT_NEAR(law.GetAzimuth(s) * kDegToRad, row[kTangent], tol(row[kTangent]));
     // The curvature is a closed form in x: only the coefficient's offset shows (and the series' at the end).
     EXPECT_NEAR(law.getCurvatureAtLength(s), row[kCurvature],
