@@ -32,6 +32,10 @@ TEST(FindLineCoeffs, NormalisedShapesAndCoincidentPoints) {
   expectLine(l, -1, 0, 2);
   ASSERT_TRUE(FindPerpendicular(CLineCoeffs(-1, 0, 3), Pt(2, 7), l));
   expectLine(l, 0, -1, 7);
+  Pt point(-3, -4);  // parallel lines fail and leave the point
+  EXPECT_FALSE(FindLinesIntersection(CLineCoeffs(2, -1, 0), CLineCoeffs(2, -1, 5), point) ||
+               FindLinesIntersection(CLineCoeffs(-1, 0, 1), CLineCoeffs(-1, 0, 4), point));
+  EXPECT_TRUE(point[0] == -3.0 && point[1] == -4.0);
 }
 
 // Both defining points lie on the line; the foot of a point (intersection of the line and its
@@ -47,38 +51,22 @@ TEST(ImplicitLines, DefiningPointsLieOnTheLineAndTheFootIsTheProjection) {
     EXPECT_TRUE(line.b == -1.0 || (line.a == -1.0 && line.b == 0.0));
     // Residuals are in units of y; allow for the slope magnifying rounding of x.
     const double scale = 8e-15 * (1.0 + std::fabs(line.a)) * (std::fabs(c[0][0]) + std::fabs(c[0][1]) + 1.0);
-    EXPECT_NEAR(residual(line, c[0]), 0.0, scale);
-    EXPECT_NEAR(residual(line, c[1]), 0.0, scale);
+    EXPECT_TRUE(std::fabs(residual(line, c[0])) <= scale && std::fabs(residual(line, c[1])) <= scale);
     ASSERT_TRUE(FindPerpendicular(line, c[2], perp));
     Pt foot(0, 0);
     ASSERT_TRUE(FindLinesIntersection(line, perp, foot));
     const Pt d = c[1] - c[0];
     const Pt expected = c[0] + d * (((c[2] - c[0]) * d) / (d * d));
-    EXPECT_NEAR(foot[0], expected[0], 1e-9);
-    EXPECT_NEAR(foot[1], expected[1], 1e-9);
+    EXPECT_TRUE(std::fabs(foot[0] - expected[0]) <= 1e-9 && std::fabs(foot[1] - expected[1]) <= 1e-9);
   }
 }
 
-TEST(FindLinesIntersection, ParallelLinesFailAndLeaveThePoint) {
-  Pt point(-3, -4);
-  EXPECT_FALSE(FindLinesIntersection(CLineCoeffs(2, -1, 0), CLineCoeffs(2, -1, 5), point));
-  EXPECT_FALSE(FindLinesIntersection(CLineCoeffs(-1, 0, 1), CLineCoeffs(-1, 0, 4), point));
-  EXPECT_TRUE(point[0] == -3.0 && point[1] == -4.0);
-}
-
 TEST(QuadraticRoots, CountAndOrderOfTheRoots) {
-  struct {
-    double a, b, c;
-    int count;
-    double x1, x2;
-  } const cases[] = {{1, -3, 2, 2, 2, 1},          // two roots, the larger first for a > 0
-                     {-1, 3, -2, 2, 1, 2},         // a < 0: the order turns round
-                     {1, 2, 1, 1, -1, -1},         // double root
-                     {1, 0, 1, 0, 0, 0},           // no real root: both zeroed
-                     {1e-14, 2, -4, 1, 2, 2},      // a below 1e-13: linear
-                     {0, 1e-6, 3, 0, 0, 0},        // linear with a vanishing slope
-                     {2, -8, 8 + 1e-14, 1, 2, 2},  // D about -8e-14: a double root
-                     {2, -8, 8 + 4e-14, 0, 0, 0}};  // D about -3.2e-13: none
+  // Two roots, the larger first for a > 0 and turned round for a < 0; a double root; none (both zeroed); a
+  // below 1e-13 is linear, also with a vanishing slope; D about -8e-14 is a double root, -3.2e-13 none.
+  struct { double a, b, c; int count; double x1, x2; } const cases[] = {
+      {1, -3, 2, 2, 2, 1}, {-1, 3, -2, 2, 1, 2},   {1, 2, 1, 1, -1, -1},        {1, 0, 1, 0, 0, 0},
+      {1e-14, 2, -4, 1, 2, 2}, {0, 1e-6, 3, 0, 0, 0}, {2, -8, 8 + 1e-14, 1, 2, 2}, {2, -8, 8 + 4e-14, 0, 0, 0}};
   for (const auto& r : cases) {
     SCOPED_TRACE(::testing::Message() << r.a << " " << r.b << " " << r.c);
     double x1 = 99.0, x2 = 99.0;

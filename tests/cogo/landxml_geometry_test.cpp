@@ -6,7 +6,6 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
-#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
@@ -25,60 +24,48 @@ namespace {
 using svy_math::units::kPi;
 
 struct Element {
-  std::string file;
-  std::string head;  // the opening tag with its attributes
-  std::string body;
-  double radiansPerUnit;  // of the file's directions
+  std::string file, head, body;  // head: the opening tag with its attributes
+  double radiansPerUnit;         // of the file's directions
 };
 
 std::string textAttribute(const std::string& head, const std::string& name) {
   const std::string key = " " + name + "=\"";
   const std::size_t at = head.find(key);
   if (at == std::string::npos) return std::string();
-  const std::size_t end = head.find('"', at + key.size());
-  return head.substr(at + key.size(), end - at - key.size());
+  return head.substr(at + key.size(), head.find('"', at + key.size()) - at - key.size());
 }
 
 // The value of attribute `name` in an opening tag, or NaN when it is absent or not a number.
 double attribute(const std::string& head, const std::string& name) {
-  char* end = nullptr;
-  const std::string text = textAttribute(head, name);
-  const double value = std::strtod(text.c_str(), &end);
-  return text.empty() || end == text.c_str() ? std::nan("") : value;
+  std::istringstream text(textAttribute(head, name));
+  double value = std::nan("");
+  return text >> value ? value : std::nan("");
 }
 
 // "<Start>N E [Z]</Start>" inside an element.
 bool childPos(const std::string& body, const std::string& child, C2dPos& pos) {
   const std::size_t at = body.find("<" + child + ">");
-  if (at == std::string::npos) return false;
-  std::istringstream numbers(body.substr(at + child.size() + 2));
+  std::istringstream numbers(at == std::string::npos ? std::string() : body.substr(at + child.size() + 2));
   return static_cast<bool>(numbers >> pos.north() >> pos.east());
-}
-
-// Radians per unit of the file's directionUnit; NaN when the file gives none.
-double radiansPerDirectionUnit(const std::string& text) {
-  const std::string unit = textAttribute(text, "directionUnit");
-  if (unit == "grads") return kPi / 200.0;
-  if (unit == "decimal degrees") return kPi / 180.0;
-  if (unit == "radians") return 1.0;
-  return std::nan("");
 }
 
 std::vector<Element> collect(const std::string& tag) {
   std::vector<Element> out;
-  const std::filesystem::path root = svy_test::refdataPath("alignment/ifc-infra-unit-test");
-  for (const auto& entry : std::filesystem::recursive_directory_iterator(root)) {
+  for (const auto& entry :
+       std::filesystem::recursive_directory_iterator(svy_test::refdataPath("alignment/ifc-infra-unit-test"))) {
     const std::string ext = entry.path().extension().string();
     if (ext != ".xml" && ext != ".XML") continue;
     std::ifstream in(entry.path(), std::ios::binary);
     const std::string text{std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+    const std::string unit = textAttribute(text, "directionUnit");
+    const double perUnit = unit == "grads" ? kPi / 200.0 : unit == "decimal degrees" ? kPi / 180.0
+                           : unit == "radians" ? 1.0 : std::nan("");
     std::size_t at = 0;
     while ((at = text.find("<" + tag + " ", at)) != std::string::npos) {
-      const std::size_t headEnd = text.find('>', at);
-      const std::size_t close = text.find("</" + tag + ">", headEnd);
+      const std::size_t headEnd = text.find('>', at), close = text.find("</" + tag + ">", headEnd);
       if (headEnd == std::string::npos || close == std::string::npos) break;
       out.push_back(Element{entry.path().filename().string(), text.substr(at, headEnd - at),
-                            text.substr(headEnd + 1, close - headEnd - 1), radiansPerDirectionUnit(text)});
+                            text.substr(headEnd + 1, close - headEnd - 1), perUnit});
       at = close;
     }
   }
@@ -95,8 +82,7 @@ TEST(LandXmlLines, InverseGivesThePublishedDirectionAndLength) {
   for (const Element& line : lines) {
     SCOPED_TRACE(line.file + ": " + line.head);
     C2dPos start, end;
-    ASSERT_TRUE(childPos(line.body, "Start", start));
-    ASSERT_TRUE(childPos(line.body, "End", end));
+    ASSERT_TRUE(childPos(line.body, "Start", start) && childPos(line.body, "End", end));
     double azimuth = 0, distance = 0;
     ASSERT_TRUE(Inverse2D(start.east(), start.north(), end.east(), end.north(), azimuth, distance));
     EXPECT_NEAR(distance, attribute(line.head, "length"), kPublishedPos);
