@@ -33,9 +33,10 @@ const C2dPos kSouthGrid(9876543.21, 712345.67);  // near the southern false nort
 // finds exactly the chosen points, the one met first from the first line point first.
 TEST(LineCircle, FindsBothChordEndsInTravelOrder) {
   // Azimuths (degrees) of the chord ends seen from the centre; the line points as parameters along end1 -> end2.
-  struct { C2dPos center; double radius, az1, az2, t1, t2; } const cases[] = {{kOrigin, 10.0, 30.0, 150.0, 0.25, 0.75},  {kOrigin, 5.0, 10.0, -10.0, 0.0, 1.0},
-                     {kOrigin, 5.0, 89.99, 90.01, 0.0, 1.0},    {kGrid, 250.0, 100.0, 280.0, 1.0, -3.0},
-                     {kGrid, 1000.0, 300.0, 300.5, -2.0, 7.0},  {kSouthGrid, 3000.0, 135.0, 315.0, 4.0, 2.0}};
+  struct { C2dPos center; double radius, az1, az2, t1, t2; } const cases[] = {
+      {kOrigin, 10.0, 30.0, 150.0, 0.25, 0.75},  {kOrigin, 5.0, 10.0, -10.0, 0.0, 1.0},
+      {kOrigin, 5.0, 89.99, 90.01, 0.0, 1.0},    {kGrid, 250.0, 100.0, 280.0, 1.0, -3.0},
+      {kGrid, 1000.0, 300.0, 300.5, -2.0, 7.0},  {kSouthGrid, 3000.0, 135.0, 315.0, 4.0, 2.0}};
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c.radius << " " << c.az1 << " " << c.az2 << " " << c.t1);
     const C2dPos end1 = onCircle(c.center, c.radius, c.az1), end2 = onCircle(c.center, c.radius, c.az2);
@@ -104,8 +105,9 @@ TEST(TwoCircles, FindsBothPointsRightOfTheCentreLineFirst) {
 // Tangent circles touch once on the centre line; a micrometre apart (or further inside) they do not meet,
 // a micrometre the other way they cross.
 TEST(TwoCircles, TangentCirclesTouchOnceOnTheCentreLine) {
-  struct { C2dPos center1; double r1, r2, azimuthDeg; bool internal; } const cases[] = {{kGrid, 250.0, 40.0, 211.0, false}, {kGrid, 40.0, 250.0, 45.0, true},
-                     {kSouthGrid, 1500.0, 1499.0, 95.0, true}};
+  struct { C2dPos center1; double r1, r2, azimuthDeg; bool internal; } const cases[] = {
+      {kGrid, 250.0, 40.0, 211.0, false}, {kGrid, 40.0, 250.0, 45.0, true},
+      {kSouthGrid, 1500.0, 1499.0, 95.0, true}};
   for (const auto& c : cases) {
     SCOPED_TRACE(::testing::Message() << c.r1 << " " << c.r2 << " " << c.azimuthDeg);
     const double d = c.internal ? std::fabs(c.r1 - c.r2) : c.r1 + c.r2;
@@ -127,16 +129,17 @@ TEST(TwoCircles, TangentCirclesTouchOnceOnTheCentreLine) {
 TEST(NoSolution, DisjointNestedConcentricAndInvalidInput) {
   C2dPos s1(-1, -1), s2(-2, -2);
   const C2dPos a(1.0, 2.0), b(3.0, 5.0), n(kNaN, 0.0), far(1e308, 0.0);
-  struct { C2dPos p, q, center; double radius; } const lines[] = {{a, a, kOrigin, 10.0}, {a, b, kOrigin, 0.0}, {a, b, kOrigin, -10.0}, {a, b, kOrigin, kNaN},
-                     {a, b, n, 10.0},       {n, b, kOrigin, 10.0}, {far, C2dPos(1e308, 1.0), C2dPos(-1e308, 0.0), 1.0}};
+  struct { C2dPos p, q, center; double radius; } const lines[] = {
+      {a, a, kOrigin, 10.0}, {a, b, kOrigin, 0.0}, {a, b, kOrigin, -10.0}, {a, b, kOrigin, kNaN},
+      {a, b, n, 10.0},       {n, b, kOrigin, 10.0}, {far, C2dPos(1e308, 1.0), C2dPos(-1e308, 0.0), 1.0}};
   for (const auto& c : lines) EXPECT_EQ(IntersectionCoordsOfLineAndCircle(c.p, c.q, c.center, c.radius, s1, s2), 0);
   const C2dPos north30(kGrid.north() + 30.0, kGrid.east()), north3(kGrid.north() + 3.0, kGrid.east());
-  struct { C2dPos c1; double r1; C2dPos c2; double r2; } const cases[] = {{kGrid, 10.0, north30, 10.0}, {kGrid, 50.0, north3, 10.0}, {kGrid, 50.0, kGrid, 20.0},
-                     {kGrid, 50.0, kGrid, 50.0},
-                     {kGrid, 50.0, C2dPos(kGrid.north() + 1e-9, kGrid.east()), 50.0},
-                     {kGrid, 0.0, kOrigin, 10.0},   {kGrid, 10.0, kOrigin, -10.0}, {kGrid, kNaN, kOrigin, 10.0},
-                     {C2dPos(0.0, kNaN), 10.0, kOrigin, 10.0},
-                     {C2dPos(-1e308, 0.0), 1e308, C2dPos(1e308, 0.0), 1e308}};
+  struct { C2dPos c1; double r1; C2dPos c2; double r2; } const cases[] = {
+      {kGrid, 10.0, north30, 10.0}, {kGrid, 50.0, north3, 10.0}, {kGrid, 50.0, kGrid, 20.0},
+      {kGrid, 50.0, kGrid, 50.0}, {kGrid, 50.0, C2dPos(kGrid.north() + 1e-9, kGrid.east()), 50.0},
+      {kGrid, 0.0, kOrigin, 10.0},   {kGrid, 10.0, kOrigin, -10.0}, {kGrid, kNaN, kOrigin, 10.0},
+      {C2dPos(0.0, kNaN), 10.0, kOrigin, 10.0},
+      {C2dPos(-1e308, 0.0), 1e308, C2dPos(1e308, 0.0), 1e308}};
   for (const auto& c : cases) EXPECT_EQ(IntersectionCoordsOfTwoCircles(c.c1, c.r1, c.c2, c.r2, s1, s2), 0);
   EXPECT_TRUE(s1 == C2dPos(-1, -1) && s2 == C2dPos(-2, -2));
 }

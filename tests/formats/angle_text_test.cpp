@@ -21,19 +21,15 @@ constexpr double kInf = std::numeric_limits<double>::infinity();
 
 // Fields are padded, rounding carries (not reduced), the sign goes in front; non-finite input gives no text.
 TEST(AngleTextWriting, PadsFieldsCarriesAndSigns) {
-  struct {
-    CSvyString (*write)(double, int);
-    double degrees;
-    int decimals;
-    const wchar_t* text;
-  } const cases[] = {
+  struct { CSvyString (*write)(double, int); double degrees; int decimals; const wchar_t* text; } const cases[] = {
       {DMSToString, kDms, 2, L"45\u00B030'15.25\""},          {DMSToString, -0.5, 0, L"-0\u00B030'00\""},
       {DMSToString, 359.99999999, 2, L"360\u00B000'00.00\""}, {DMSToString, -0.00000001, 2, L"0\u00B000'00.00\""},
       {DMSToString, 1.0, -3, L"1\u00B000'00\""},              {DMMToString, -12.0 + -5.5 / 60, 1, L"-12\u00B005.5'"},
       {DMMToString, 10.99999, 2, L"11\u00B000.00'"},          {DegreeToString, -2.675, 2, L"-2.68\u00B0"},
       {DegreeToBearing, 0.0, 0, L"N 0\u00B000'00\" E"},       {DegreeToBearing, 180.0, 0, L"S 0\u00B000'00\" E"},
       {DegreeToBearing, 270.0, 0, L"N 90\u00B000'00\" W"},    {DegreeToBearing, -45.0, 0, L"N 45\u00B000'00\" W"},
-      {DegreeToBearing, 405.0, 0, L"N 45\u00B000'00\" E"},    {DegreeToBearing, 192.0 + 5.0 / 60, 0, L"S 12\u00B005'00\" W"},
+      {DegreeToBearing, 405.0, 0, L"N 45\u00B000'00\" E"},
+      {DegreeToBearing, 192.0 + 5.0 / 60, 0, L"S 12\u00B005'00\" W"},
       {DegreeToBearing, 10.0 + 59.0 / 60 + 59.96 / 3600, 1, L"N 11\u00B000'00.0\" E"},
       {DegreeToBearing, 30.0, -2, L"N 30\u00B000'00\" E"},    {DMSToString, kNaN, 2, L""},
       {DMSToString, 1e300, 2, L""}, {DMMToString, -kInf, 2, L""}, {DegreeToString, kNaN, 2, L""},
@@ -43,11 +39,7 @@ TEST(AngleTextWriting, PadsFieldsCarriesAndSigns) {
 
 // Each reader accepts its typed forms and leaves the value alone when it fails.
 TEST(AngleTextReading, AcceptsTypedFormsAndLeavesFailuresAlone) {
-  struct {
-    const wchar_t* text;
-    bool dms, dmm, degree;
-    double degrees;
-  } const cases[] = {
+  struct { const wchar_t* text; bool dms, dmm, degree; double degrees; } const cases[] = {
       {L"45\u00B030'15.25\"", true, false, false, kDms}, {L"45:30:15,25", true, false, false, kDms},
       {L"45d30m15.25s", true, false, false, kDms},       {L" 45\u00B0 30\u2032 15.25\u2033 ", true, false, false, kDms},
       {L"-12\u00B005'", true, true, false, -(12.0 + 5.0 / 60)}, {L"+12 5.5", true, true, false, 12.0 + 5.5 / 60},
@@ -99,10 +91,7 @@ TEST(AngleTextRoundTrip, WrittenFormsReadBack) {
 }
 
 TEST(CheckValidDMSVal, AcceptsOnlyWellFormedFieldsWithinTheLimits) {
-  struct {
-    const wchar_t *text, *maxDegrees;
-    bool allowMax, valid;
-  } const cases[] = {
+  struct { const wchar_t *text, *maxDegrees; bool allowMax, valid; } const cases[] = {
       {L"360.0000", L"360", true, true},     {L"360.0000", L"360", false, false}, {L"360.0001", L"360", true, false},
       {L"359.59599", L"360", false, true},   {L"0360", L"360", true, false},      {L"036", L"360", false, true},
       {L"90.0030", L"90", true, false},      {L"45.5", L"360", false, true},      {L"45.6", L"360", false, false},

@@ -39,10 +39,7 @@ TEST(ToRange, KeepsBothEndsWrapsByWholePeriodsAndTerminates) {
 // turn), reductions that keep the sign, unit definitions (one circle is 2 pi rad, 400 grad, 6400 mil; one
 // grad is 10000 centesimal seconds = 3240 seconds of arc) and atan3's zero for a (nearly) zero vector.
 TEST(Reductions, DocumentedRangesAndUnits) {
-  struct {
-    Fn fn;
-    double x, expected, tol;
-  } const cases[] = {
+  struct { Fn fn; double x, expected, tol; } const cases[] = {
       {Normalize0To2PI, kTwoPi, kTwoPi, 1e-12},      {Normalize0To2PI, -1, kTwoPi - 1, 1e-12},
       {Normalize0ToLt2Pi, kTwoPi, 0, 1e-12},         {Normalize0ToLt2Pi, -kTwoPi, 0, 1e-12},
       {Normalize0ToPi, 4, 4 - kTwoPi, 1e-12},        {Normalize0ToPi, kPi, kPi, 1e-12},
@@ -58,8 +55,7 @@ TEST(Reductions, DocumentedRangesAndUnits) {
       {[](double x) { return AngleDiff(x, 10); }, 350, -20, 0},
       {[](double x) { return AngleDiff(x, 0); }, -180, 180, 0},
       {[](double x) { return AngleDiff(x, 0); }, 720, 360, 0},   {MinimizeTurnAngle, -340, 20, 0},
-      {MinimizeTurnAngle, 720, 360, 0},
-      {[](double x) { return Deg2Rad(x, true); }, 360, kTwoPi, 1e-15},
+      {MinimizeTurnAngle, 720, 360, 0}, {[](double x) { return Deg2Rad(x, true); }, 360, kTwoPi, 1e-15},
       {[](double x) { return Deg2Grad(x, true); }, 360, 400, 1e-12},
       {[](double x) { return Deg2Mil(x, true); }, 360, 6400, 1e-9},
       {[](double x) { return DegSec2GradCC(x, false); }, 3240, 10000, 1e-9},
@@ -76,12 +72,7 @@ TEST(Reductions, DocumentedRangesAndUnits) {
 // Every reduction ends on absurd input: NaN gives NaN, infinities give NaN (the radian normalizers pass them
 // through), huge and tiny values land in range.
 TEST(Reductions, TerminateInRangeOnAbsurdInput) {
-  struct {
-    const char* name;
-    Fn fn;
-    double lo, hi;
-    bool passesInfinity;
-  } const reducers[] = {
+  struct { const char* name; Fn fn; double lo, hi; bool passesInfinity; } const reducers[] = {
       {"toRange pi", [](double x) { return toRange(x, -kPi, kPi); }, -kPi, kPi, false},
       {"toRange 360", [](double x) { return toRange(x, 0.0, 360.0); }, 0, 360, false},
       {"Normalize0To2PI", Normalize0To2PI, 0, kTwoPi, true},
@@ -91,10 +82,8 @@ TEST(Reductions, TerminateInRangeOnAbsurdInput) {
       {"NormalizeGtNegPiToPi", NormalizeGtNegPiToPi, -kPi, kPi, true},
       {"ModDeg360", [](double x) { return ModDeg360(x, true); }, 0, 360, false},
       {"ModDeg180", [](double x) { return ModDeg180(x, false); }, -180, 180, false},
-      {"pos360", pos360, 0, 360, false},
-      {"HR2HL", HR2HL, 0, 360, false},
-      {"Zenith2Level", Zenith2Level, 0, 360, false},
-      {"DDDMMSS2Deg", DDDMMSS2Deg, -361, 361, false},
+      {"pos360", pos360, 0, 360, false}, {"HR2HL", HR2HL, 0, 360, false},
+      {"Zenith2Level", Zenith2Level, 0, 360, false}, {"DDDMMSS2Deg", DDDMMSS2Deg, -361, 361, false},
       {"Deg2DDDMMSS", [](double x) { return Deg2DDDMMSS(x, 4, false); }, -360, 360, false},
       {"Deg2DDMMDEC", [](double x) { return Deg2DDMMDEC(x, 4, false); }, -360, 360, false},
       {"Deg2Rad", [](double x) { return Deg2Rad(x, false); }, -kTwoPi, kTwoPi, false},

@@ -64,8 +64,7 @@ TEST(AngleSetters, TangentAzimuthVertexBulgeAndDmsForms) {
     bool expectedOk;
     double expected;
   } const results[] = {{a.setTg(0, 0), a.getRad(), true, 0},
-                       {a.setTg(kInf, 1), a.getRad(), true, kPi / 2},
-                       {a.setTg(kNaN, 1), a.getRad(), false, kPi / 2},
+                       {a.setTg(kInf, 1), a.getRad(), true, kPi / 2}, {a.setTg(kNaN, 1), a.getRad(), false, kPi / 2},
                        {a.setAz(o, C2dPos(-1, 0)), a.getRad(), true, kPi},
                        {a.setAz(C2dPos(-1, -1)), a.getRad(), true, -0.75 * kPi},
                        {a.setAz(10, 10, 10, 20), a.getRad(), true, kPi / 2},
@@ -135,7 +134,8 @@ TEST(AngleGeometry, DirectionsPositionsAndRotationsFollowTheNorthEastConvention)
   CMathAngle(180.0).getRotatedPoint(C2dPos(10, 10), C2dPos(11, 10), r);
   EXPECT_NEAR((r - C2dPos(9, 10)).Module(), 0, 1e-12);
   const C2dPos at30(std::cos(kPi / 6), std::sin(kPi / 6));
-  EXPECT_TRUE(CMathAngle(30.0).isSameAsAzimuth(C2dPos(0, 0), at30) && !CMathAngle(31.0).isSameAsAzimuth(C2dPos(0, 0), at30));
+  EXPECT_TRUE(CMathAngle(30.0).isSameAsAzimuth(C2dPos(0, 0), at30) &&
+              !CMathAngle(31.0).isSameAsAzimuth(C2dPos(0, 0), at30));
   EXPECT_TRUE(CMathAngle(89.0).isSharp() && !CMathAngle(-90.0).isSharp());
 }
 
@@ -187,7 +187,8 @@ TEST(TAngleTwin, ConstructsFromRadiansAndSharesTheRules) {
   svy_math::TAngle q(1.0);
   EXPECT_EQ((q / 0.0).getDouble(), 0);
   q /= 0.0;
-  EXPECT_TRUE(q.isNan() && svy_math::TAngle(kPi) != svy_math::TAngle(-kPi) && svy_math::TAngle(0.1) < svy_math::TAngle(0.2));
+  EXPECT_TRUE(q.isNan() && svy_math::TAngle(kPi) != svy_math::TAngle(-kPi) &&
+              svy_math::TAngle(0.1) < svy_math::TAngle(0.2));
   EXPECT_DOUBLE_EQ(svy_math::absoluteAngle(svy_math::TAngle(-1.0)).getDouble(), 1.0);
 }
 

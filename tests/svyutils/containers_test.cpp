@@ -66,7 +66,8 @@ TEST(SvyContainers, AllocatorServesVectorsAndLists) {
   EXPECT_TRUE(chain.empty());
   EXPECT_EQ(std::vector<int>(other.begin(), other.end()), (std::vector<int>{1, 2, 3}));
   EXPECT_TRUE(svy_mem::svy_dl_allocator<int>() == svy_mem::svy_dl_allocator<double>());
-  EXPECT_THROW(svy_mem::svy_dl_allocator<double>().allocate(static_cast<std::size_t>(-1) / 4), std::bad_array_new_length);
+  EXPECT_THROW(svy_mem::svy_dl_allocator<double>().allocate(static_cast<std::size_t>(-1) / 4),
+               std::bad_array_new_length);
 }
 
 }  // namespace

@@ -66,12 +66,15 @@ TEST(Rounding, HalfAwayFromZeroOnTheWrittenDecimal) {
                      {1250.0, -2, 1300.0, L"1300"},  {-49.0, -2, -0.0, L"0"},     {1.0049999, 2, 1.0, L"1.00"},
                      {0.1, 25, 0.1, L"0.10000000000000000"}, {1e21, 2, 1e21, L"1000000000000000000000.00"},
                      {kNaN, 2, kNaN, L"nan"},        {-kInf, 2, -kInf, L"-inf"},  {1.5e300, -300, 2e300, nullptr},
-                     {kMax, -293, kMax, nullptr},    {kDenormMin, 2, 0.0, nullptr}, {kDenormMin, 400, kDenormMin, nullptr},
+                     {kMax, -293, kMax, nullptr},    {kDenormMin, 2, 0.0, nullptr},
+                     {kDenormMin, 400, kDenormMin, nullptr},
                      {123.456, INT_MAX, 123.456, nullptr}, {123.456, INT_MIN, 0.0, nullptr}};
   for (const auto& c : cases) {
     const double r = round_prec(c.value, c.decimals);
     EXPECT_TRUE(std::isnan(c.rounded) ? std::isnan(r) : r == c.rounded) << c.value << " " << c.decimals;
-    if (c.text) EXPECT_EQ(svy_formats::DoubleToString(c.value, c.decimals).str(), c.text) << c.value;
+    if (c.text) {
+      EXPECT_EQ(svy_formats::DoubleToString(c.value, c.decimals).str(), c.text) << c.value;
+    }
   }
   EXPECT_TRUE(std::signbit(round_prec(-0.001, 2)));
   const std::wstring huge = svy_formats::DoubleToString(kMax, 2).str();  // every integer digit

@@ -22,7 +22,9 @@ TEST(SvyStringCodePages, Utf8RoundTripsReplacesMalformedBytesAndCLocaleMapsBytes
   for (const auto& c : cases) {
     const CSvyString text(c.first, kCodePageUtf8);
     EXPECT_EQ(text.str(), c.second) << c.first;
-    if (c.second.find(L'\uFFFD') == std::wstring::npos) EXPECT_EQ(text.ToNarrow(kCodePageUtf8), c.first);
+    if (c.second.find(L'\uFFFD') == std::wstring::npos) {
+      EXPECT_EQ(text.ToNarrow(kCodePageUtf8), c.first);
+    }
   }
   std::string bytes;
   for (int b = 1; b < 256; ++b) bytes += static_cast<char>(b);
@@ -49,10 +51,11 @@ TEST(SvyStringEditing, SearchesSubstringsTrimsReplacesInsertsAndDeletes) {
   for (const auto& r : results) EXPECT_EQ(r[0], r[1]) << (&r - results);
   const std::pair<CSvyString, const wchar_t*> strings[] = {
       {abc.Mid(-3, 2), L"ab"}, {abc.Mid(4, 99), L"ef"}, {abc.Mid(9), L""}, {abc.Mid(1, -1), L""},
-      {abc.Left(99), L"abcdef"}, {abc.Right(-1), L""}, {abc.Right(2), L"ef"}, {CSvyString(text).TrimLeft(), L"1.5 \r\n"},
-      {text.Trim(), L"1.5"}, {CSvyString(L"   ").Trim(), L""}, {CSvyString(L"xxabxx").TrimLeft(L'x').TrimRight(L"x"), L"ab"},
-      {grow, L"--"}, {edit, L"1234"}, {CSvyString(L"Ab\u00E9").MakeUpper(), L"AB\u00C9"},
-      {CSvyString(L"Ab\u00C9").MakeLower(), L"ab\u00E9"}, {CSvyString(L'-', 3), L"---"}, {CSvyString(L"abcdef", 3), L"abc"}};
+      {abc.Left(99), L"abcdef"}, {abc.Right(-1), L""}, {abc.Right(2), L"ef"},
+      {CSvyString(text).TrimLeft(), L"1.5 \r\n"}, {text.Trim(), L"1.5"}, {CSvyString(L"   ").Trim(), L""},
+      {CSvyString(L"xxabxx").TrimLeft(L'x').TrimRight(L"x"), L"ab"}, {grow, L"--"}, {edit, L"1234"},
+      {CSvyString(L"Ab\u00E9").MakeUpper(), L"AB\u00C9"}, {CSvyString(L"Ab\u00C9").MakeLower(), L"ab\u00E9"},
+      {CSvyString(L'-', 3), L"---"}, {CSvyString(L"abcdef", 3), L"abc"}};
   for (const auto& c : strings) EXPECT_EQ(c.first.str(), c.second) << (&c - strings);
   edit.SetAt(0, L'9');
   edit.SetAt(4, L'x');
