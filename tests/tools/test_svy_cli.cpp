@@ -3,7 +3,6 @@
 
 #include <gtest/gtest.h>
 
-#include <sstream>
 #include <string>
 #include <vector>
 
@@ -46,13 +45,6 @@ TEST(SvyOutput, FullPrecisionReadsBackToTheSameDoubles) {
   EXPECT_EQ(runSvy({"cogo", "radiate"}, "0,0,45,1\n").lines().at(1), "0.7071,0.7071");
 }
 
-std::vector<std::string> words(const std::string& text) {
-  std::istringstream in(text);
-  std::vector<std::string> all;
-  for (std::string word; in >> word;) all.push_back(word);
-  return all;
-}
-
 // Per verb family: the header line, the same good row before and after two bad rows, the message for line 2.
 TEST(SvyBadRows, ReportedWithLineNumbersWhileGoodRowsComeOut) {
   const char* const toGps = "week,seconds_of_week";
@@ -76,7 +68,8 @@ TEST(SvyBadRows, ReportedWithLineNumbersWhileGoodRowsComeOut) {
   for (const auto& [args, input, header, message] : cases) {
     SCOPED_TRACE(std::string(args) + ": " + input);
     const std::string text = input;
-    const SvyResult r = runSvy(words(args), text + "a,b,c,d,e,f,g\n" + text.substr(0, text.find('\n') + 1));
+    const SvyResult r =
+        runSvy(svy_test::split(args, ' '), text + "a,b,c,d,e,f,g\n" + text.substr(0, text.find('\n') + 1));
     EXPECT_EQ(r.exitStatus, 1);
     const std::vector<std::string> out = r.lines();
     ASSERT_EQ(out.size(), 3u) << r.out;
@@ -110,7 +103,7 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
   };
   for (const auto& [args, message] : cases) {
     SCOPED_TRACE(args);
-    const SvyResult r = runSvy(words(args), "1,2,3\n");
+    const SvyResult r = runSvy(svy_test::split(args, ' '), "1,2,3\n");
     EXPECT_EQ(r.exitStatus, 2);
     EXPECT_EQ(r.out, "");
     EXPECT_EQ(r.errLines().size(), 1u) << r.err;
