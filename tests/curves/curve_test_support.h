@@ -11,6 +11,7 @@
 #include <string>
 #include <vector>
 
+#include "support/geometry.h"
 #include "svymath/curves/curve_arc.h"
 #include "svymath/curves/curve_segment.h"
 #include "svymath/curves/curve_spiral.h"
@@ -34,9 +35,7 @@ inline C2dPos posAt(const CGenericSegment& segment, double s) {
   return pos;
 }
 
-inline double distance(const C2dPos& a, const C2dPos& b) {
-  return std::hypot(a.north() - b.north(), a.east() - b.east());
-}
+using svy_test::dist;
 
 // An arc element starting at (north, east) heading azDeg degrees, of the given length and radius magnitude.
 inline CCurveArc makeArc(double north, double east, double azDeg, double length, double radius, bool toTheRight) {
@@ -66,7 +65,7 @@ inline double sampledDistance(const CGenericSegment& segment, const C2dPos& p, i
   double best = kInf;
   C2dPos q;
   for (int i = 0; i <= samples; ++i) {
-    if (segment.getPosAtLength(segment.getTotalLength() * i / samples, q)) best = std::fmin(best, distance(p, q));
+    if (segment.getPosAtLength(segment.getTotalLength() * i / samples, q)) best = std::fmin(best, dist(p, q));
   }
   return best;
 }
@@ -97,7 +96,7 @@ inline void expectStepsWithinDeviation(const CGenericSegment& segment, double de
       const C2dPos p = posAt(segment, s + (next - s) * i / 16.0);
       worst = std::fmax(worst, std::fabs((to.north() - from.north()) * (p.east() - from.east()) -
                                          (to.east() - from.east()) * (p.north() - from.north())) /
-                                   distance(from, to));
+                                   dist(from, to));
     }
     EXPECT_LE(worst, deviation + 1e-9) << s;
     s = next;

@@ -14,7 +14,7 @@
 
 namespace {
 
-using curve_test::distance;
+using curve_test::dist;
 using curve_test::makeArc;
 using curve_test::posAt;
 using svy_math::units::kPi;
@@ -81,15 +81,15 @@ TEST(ArcElement, ClosedFormCircleAndCurveIp) {
     curve_test::expectPosNear(centre, 5e6 - std::sin(a) * 120.0 * side, 5e5 + std::cos(a) * 120.0 * side, 1e-8);
     for (double s = 0.0; s <= 250.0; s += 12.5) {
       const C2dPos pos = posAt(arc, s);
-      EXPECT_NEAR(distance(pos, centre), 120.0, 1e-8);
-      EXPECT_NEAR(distance(pos, arc.getStartPos()), 240.0 * std::sin(s / 240.0), 1e-8);
+      EXPECT_NEAR(dist(pos, centre), 120.0, 1e-8);
+      EXPECT_NEAR(dist(pos, arc.getStartPos()), 240.0 * std::sin(s / 240.0), 1e-8);
       EXPECT_NEAR(arc.getAzimuthAtLength(s), CMathAngle(63.0 + side * s / 120.0 * 57.29577951308232).getDeg(), 1e-9);
     }
     EXPECT_NEAR(arc.getCurvatureAtLength(10.0), side / 120.0, 1e-15);
     const CCurveArc shorter = makeArc(50.0, 60.0, 17.0, 90.0, 150.0, right);
     ASSERT_TRUE(shorter.getCurveIp(ip));
     for (const C2dPos& end : {shorter.getStartPos(), shorter.getEndPos()}) {
-      EXPECT_NEAR(distance(ip, end), 150.0 * std::tan(0.3), 1e-9);
+      EXPECT_NEAR(dist(ip, end), 150.0 * std::tan(0.3), 1e-9);
     }
   }
   C2dPos ip;
@@ -122,7 +122,7 @@ TEST(ArcElement, RoundTripProjectionAndBoxAgainstSampling) {
         ASSERT_TRUE(arc.getShortestDistAndCurveLen(n, e, dist, len));
         const double sampled = curve_test::sampledDistance(arc, C2dPos(n, e), static_cast<int>(c.length * 100.0));
         EXPECT_TRUE(std::fabs(dist) <= sampled + 1e-9 && std::fabs(dist) >= sampled - 1e-3) << n << " " << e;
-        EXPECT_NEAR(distance(posAt(arc, len), C2dPos(n, e)), std::fabs(dist), 1e-9);
+        EXPECT_NEAR(curve_test::dist(posAt(arc, len), C2dPos(n, e)), std::fabs(dist), 1e-9);
       }
     }
     curve_test::expectBoxHoldsSamples(arc, 4000, 1e-3);

@@ -112,8 +112,8 @@ TEST(ArcFromTangents, TouchesBothTangents) {
     EXPECT_EQ(std::fabs(arc.radius), R);
     EXPECT_EQ(arc.radius > 0.0, arc.delta > 0.0);
     for (const C2dPos& p : {arc.start, arc.end}) {
-      EXPECT_NEAR(curve_test::distance(pi, p), arc.tangent, tolPos);
-      EXPECT_NEAR(curve_test::distance(arc.centre, p), R, tolPos);
+      EXPECT_NEAR(curve_test::dist(pi, p), arc.tangent, tolPos);
+      EXPECT_NEAR(curve_test::dist(arc.centre, p), R, tolPos);
     }
     const CMathAngle in(c.azIn), out(c.azOut);
     EXPECT_NEAR(

@@ -115,7 +115,7 @@ TEST_P(SpiralData, RoundTripProjectionBoxAndSteps) {
       const double sampled = curve_test::sampledDistance(spiral, p, 4000);
       EXPECT_TRUE(std::fabs(dist) <= sampled + 1e-9 && std::fabs(dist) >= sampled - 1e-4) << dist << " " << sampled;
       const C2dPos foot = curve_test::posAt(spiral, len);
-      EXPECT_NEAR(curve_test::distance(foot, p), std::fabs(dist), 1e-9);
+      EXPECT_NEAR(curve_test::dist(foot, p), std::fabs(dist), 1e-9);
       CMathAngle tangent;
       ASSERT_TRUE(spiral.getAzimuthAtLength(len, tangent));
       const double along = tangent.getCos() * (p.north() - foot.north()) + tangent.getSin() * (p.east() - foot.east());

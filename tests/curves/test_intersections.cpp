@@ -168,7 +168,7 @@ TEST(SpiralIntersection, SquareLinesCrossOnceOnTheApproximatingArcs) {
       EXPECT_LT(nearestArc, 1e-8);
       ASSERT_TRUE(spiral.getShortestDistanceToPoint(hits[0], distance));
       EXPECT_LT(distance, 1e-4);  // the approximation's own error, far below a millimetre here
-      EXPECT_TRUE(at == across || curve_test::distance(hits[0], on) < 1e-9);
+      EXPECT_TRUE(at == across || curve_test::dist(hits[0], on) < 1e-9);
     }
   }
 }
