@@ -1,4 +1,5 @@
-// The svy verbs one by one: known and published values, deliberate quirks, and round trips between verbs.
+// The svy command: input sources, output forms and errors, then the verbs one by one with known and
+// published values, deliberate quirks, and round trips between verbs.
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -19,24 +20,130 @@ using svy_test::examplesPath;
 using svy_test::runJson;
 using svy_test::runSvy;
 using svy_test::splitCsvLine;
+using svy_test::SvyResult;
+
+// The command as a whole: input sources, output forms, one bad row per verb family, usage errors.
+
+const std::string kInversePoints = "n1,e1,n2,e2\n0,0,3,4\n# a comment\n\n100,200,100,150\n";
+
+TEST(SvyInput, FileAndStdinGiveTheSameRows) {
+  const SvyResult fromStdin = runSvy({"cogo", "inverse"}, kInversePoints);
+  EXPECT_EQ(fromStdin.exitStatus, 0) << fromStdin.err;
+  EXPECT_EQ(fromStdin.lines().size(), 3u);
+  EXPECT_EQ(runSvy({"cogo", "inverse", "-"}, kInversePoints).out, fromStdin.out);
+  EXPECT_EQ(runSvy({"cogo", "inverse", svy_test::writeTempFile(kInversePoints)}).out, fromStdin.out);
+  const SvyResult missing = runSvy({"cogo", "inverse", "/nonexistent/points.csv"});
+  EXPECT_EQ(missing.exitStatus, 2);
+  EXPECT_EQ(missing.err.rfind("svy: cannot open '/nonexistent/points.csv'", 0), 0u) << missing.err;
+  EXPECT_EQ(runSvy({"cogo", "radiate"}, "").out, "n,e\n");
+  EXPECT_EQ(runSvy({"--json", "cogo", "radiate"}, "# nothing\n").out, "[]\n");
+}
+
+TEST(SvyOutput, JsonObjectsKeyedByColumnAndWellFormedAroundBadRows) {
+  const nlohmann::json rows = nlohmann::json::parse(runSvy({"--json", "cogo", "inverse"}, kInversePoints).out);
+  ASSERT_EQ(rows.size(), 2u);
+  EXPECT_DOUBLE_EQ(rows[0]["distance"].get<double>(), 5.0);
+  EXPECT_EQ(rows[1]["azimuth_dms"].get<std::string>(), "270\xC2\xB0" "0'0.00\"");
+  const SvyResult bad = runSvy({"--json", "cogo", "inverse"}, "0,0,3,4\nbad,row\n0,0,0,2\n");
+  EXPECT_EQ(bad.exitStatus, 1);
+  EXPECT_EQ(nlohmann::json::parse(bad.out).at(1)["distance"].get<double>(), 2.0);
+}
+
+TEST(SvyOutput, FullPrecisionReadsBackToTheSameDoubles) {
+  const SvyResult out = runSvy({"--full-precision", "cogo", "radiate"}, "1000.123,2000.456,37.5,123.456789\n");
+  ASSERT_EQ(out.exitStatus, 0) << out.err;
+  const nlohmann::json back = svy_test::runJson({"cogo", "inverse"}, "1000.123,2000.456," + out.lines().at(1) + "\n");
+  EXPECT_NEAR(back[0]["distance"].get<double>(), 123.456789, 1e-12);
+  EXPECT_NEAR(back[0]["azimuth_deg"].get<double>(), 37.5, 1e-11);
+  EXPECT_EQ(runSvy({"cogo", "radiate"}, "0,0,45,1\n").lines().at(1), "0.7071,0.7071");
+}
+
+// Per verb family: the header line, the same good row before and after two bad rows, the message for line 2.
+TEST(SvyBadRows, ReportedWithLineNumbersWhileGoodRowsComeOut) {
+  const char* const toGps = "week,seconds_of_week";
+  const char* const cases[][4] = {
+      {"cogo inverse", "0,0,3,4\n1,2,3\n", "azimuth_deg,azimuth_dms,distance", "expected 4 numbers, got 3"},
+      {"cogo inverse", "0,0,3,4\n0,0,x,4\n", "azimuth_deg,azimuth_dms,distance", "n2: 'x' is not a number"},
+      {"cogo inverse", "0,0,1,0\n0,0,1e308,1e308\n", "azimuth_deg,azimuth_dms,distance", ""},
+      {"angle convert --from deg --to rad", "1\nabc\n", "value", "value: 'abc' is not a number"},
+      {"units convert --from m --to ft", "1\n1,2\n", "value", "expected 1 number, got 2"},
+      {"station format --interval 1", "5\n1e12\n", "chainage,text", ""},
+      {"station parse --interval 1000", "1+200\n+5\n", "text,chainage", "'+5' is not a station"},
+      {"geo to-ecef", "10,20,30\n91,0,0\n", "x,y,z", "latitude must lie within -90 to 90 degrees"},
+      {"time to-gps", "2020-01-01T00:00:00\n2021-02-29T00:00:00\n", toGps, "no such date or time"},
+      {"time to-gps", "2020-01-01T00:00:00\n1980-01-05T23:59:59.999\n", toGps, "times run from the GPS epoch"},
+      {"time to-gps", "2020-01-01T00:00:00\n2100-01-01T00:00:00\n", toGps, "times run from the GPS epoch"},
+      {"time to-gps", "2020-01-01T00:00:00\n2020-01-01T00:00:00.\n", toGps, "expected a time"},
+      {"time from-gps", "2000,0\n1.5,0\n", "time,day_of_year", "the week must be a whole number"},
+      {"time from-gps", "2000,0\n0,604800\n", "time,day_of_year", "seconds of week must lie in"},
+      {"time from-gps", "2000,0\n6260,432000\n", "time,day_of_year", "times run to 2099-12-31"},
+  };
+  for (const auto& [args, input, header, message] : cases) {
+    SCOPED_TRACE(std::string(args) + ": " + input);
+    const std::string text = input;
+    const SvyResult r =
+        runSvy(svy_test::split(args, ' '), text + "a,b,c,d,e,f,g\n" + text.substr(0, text.find('\n') + 1));
+    EXPECT_EQ(r.exitStatus, 1);
+    const std::vector<std::string> out = r.lines();
+    ASSERT_EQ(out.size(), 3u) << r.out;
+    EXPECT_EQ(out[0], header);
+    EXPECT_EQ(out[1], out[2]);
+    ASSERT_GE(r.errLines().size(), 2u) << r.err;
+    EXPECT_EQ(r.errLines()[0].rfind("svy: line 2: " + std::string(message), 0), 0u) << r.err;
+  }
+}
+
+TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
+  const char* const cases[][2] = {
+      {"angle convert --from deg --to degrees", "unknown unit 'degrees'"},
+      {"units convert --from furlong --to m", "unknown unit 'furlong'"},
+      {"units convert --from m --to m2", "cannot convert length (m)"},
+      {"units convert --from C --to hPa", "to pressure (hPa)"},
+      {"station format", "--interval"}, {"station format --interval 0", "--interval"},
+      {"cogo inverse --bogus", "--bogus"}, {"nosuchfamily", "subcommand"}, {"", "subcommand"}, {"cogo", "subcommand"},
+      {"geo enu", "--origin"}, {"geo enu --origin 55,5", "--origin"}, {"geo enu --origin 55,5,x", "--origin"},
+      {"geo enu --origin 95,5,0", "--origin"}, {"fit radius", "center"}, {"fit radius --center 1;2", "--center"},
+      {"curve solve --radius 100", "give one more quantity"}, {"curve solve --delta 20", "give the radius"},
+      {"curve solve --radius 100 --delta 20 --length 5", "excludes"},
+      {"curve solve --radius 100 --deg-arc 3 --delta 20", "excludes"},
+      {"curve solve --radius 100 --chord 250", "no circular curve of radius 100 has chord 250"},
+      {"curve solve --radius 100 --mid-ordinate 250", "no circular curve"},
+      {"curve solve --radius -5 --delta 20", "radius"},
+      {"spiral table --type cubic --length 100 --radius 100 --interval 10", "no cubic spiral"},
+      {"spiral table --length 100 --radius 300 --interval 1e-9", "interval"},
+      {"spiral table --type bloss --length 100 --radius 300 --interval 1", "bloss"},
+      {"spiral table --length 100 --radius 0 --interval 1", "radius"},
+  };
+  for (const auto& [args, message] : cases) {
+    SCOPED_TRACE(args);
+    const SvyResult r = runSvy(svy_test::split(args, ' '), "1,2,3\n");
+    EXPECT_EQ(r.exitStatus, 2);
+    EXPECT_EQ(r.out, "");
+    EXPECT_EQ(r.errLines().size(), 1u) << r.err;
+    EXPECT_EQ(r.err.rfind("svy: ", 0), 0u) << r.err;
+    EXPECT_NE(r.err.find(message), std::string::npos) << r.err;
+  }
+  const SvyResult help = runSvy({"--help"});
+  EXPECT_EQ(help.exitStatus, 0);
+  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time"}) {
+    EXPECT_NE(help.out.find(family), std::string::npos) << family;
+  }
+}
 
 // svy angle convert: known equivalents, the packed DDD.MMSS quirks, and round trips through every unit.
 
 TEST(AngleConvert, KnownValuesQuirksAndRoundTrips) {
-  struct Case {
+  const struct {
     const char *from, *to, *text;
     double expected;
-  };
-  const Case cases[] = {
-      {"deg", "rad", "90", 1.5707963267948966}, {"rad", "deg", "1.5707963267948966", 90.0},
-      {"deg", "grad", "90", 100.0},             {"grad", "deg", "100", 90.0},
-      {"deg", "mil", "90", 1600.0},             {"mil", "deg", "1600", 90.0},
-      {"deg", "dms", "90", 90.0},               {"dms", "deg", "90", 90.0},
+  } cases[] = {
+      {"deg", "rad", "90", 1.5707963267948966}, {"deg", "grad", "90", 100.0}, {"deg", "mil", "90", 1600.0},
+      {"deg", "dms", "90", 90.0},
       // No reduction to one turn, except for the packed form.
       {"deg", "grad", "450", 500.0},            {"rad", "deg", "-7", -7.0 * 57.29577951308232},
       {"dms", "deg", "400.3000", 40.5},
   };
-  for (const Case& c : cases) {
+  for (const auto& c : cases) {
     const nlohmann::json r = runJson({"angle", "convert", "--from", c.from, "--to", c.to}, c.text);
     EXPECT_NEAR(r.at(0).at("value").get<double>(), c.expected, 1e-11) << c.from << " -> " << c.to << ' ' << c.text;
   }
@@ -65,11 +172,10 @@ double convert(const std::string& from, const std::string& to, const std::string
 TEST(UnitConvert, PublishedDefinitionsAndQuirks) {
   constexpr double kFt = 0.3048;
   constexpr double kUsFt = 1200.0 / 3937.0;
-  struct Case {
+  const struct {
     const char *from, *to, *text;
     double expected, relTol;
-  };
-  const Case cases[] = {
+  } cases[] = {
       {"ft", "m", "1", kFt, 1e-15}, {"ft-us", "m", "1", kUsFt, 1e-15}, {"ch", "m", "1", 66 * kFt, 1e-15},
       {"ch-us", "m", "1", 66 * kUsFt, 1e-15}, {"ft2", "m2", "1", kFt * kFt, 1e-6},
       {"ft2-us", "m2", "1", kUsFt * kUsFt, 1e-6}, {"ch2", "m2", "1", 66 * 66 * kFt * kFt, 1e-12},
@@ -86,7 +192,7 @@ TEST(UnitConvert, PublishedDefinitionsAndQuirks) {
       {"fin", "fin-us", "10000.000", 9999.116, 1e-13},
       {"fin", "fin", "5.089", 5.089, 0.0}, {"acre-us", "acre-us", "0.1", 0.1, 0.0},  // passed through unrounded
   };
-  for (const Case& c : cases) {
+  for (const auto& c : cases) {
     EXPECT_NEAR(convert(c.from, c.to, c.text), c.expected, std::fabs(c.expected) * c.relTol) << c.from << ' ' << c.to;
   }
   const double back = convert("inHg", "hPa", std::to_string(convert("hPa", "inHg", "1013.25")));
@@ -123,13 +229,7 @@ TEST(UnitConvert, EveryUnitThereAndBackFromItsBase) {
 // svy station format and parse: the station text with its sign and rounding quirks, and the round trip.
 
 TEST(StationText, FormatAndParseQuirks) {
-  struct Case {
-    const char* verb;
-    const char* interval;
-    const char* input;
-    const char* output;  // the written row
-  };
-  const Case cases[] = {
+  const char* const cases[][4] = {  // verb, interval, input, the written row
       {"format", "1000", "1234.567", "1234.5670,1+234.57"},
       {"format", "1000", "1005.3", "1005.3000,1+5.30"},        // remainder not zero-padded
       {"format", "1000", "-1234.5", "-1234.5000,-1+-234.50"},  // both parts carry the sign
@@ -140,10 +240,10 @@ TEST(StationText, FormatAndParseQuirks) {
       {"parse", "1000", "  2+3 m", "2+3 m,2003.0000"},
       {"parse", "1000", "-1+-234.50", "-1+-234.50,-1234.5000"},
   };
-  for (const Case& c : cases) {
-    const svy_test::SvyResult r = runSvy({"station", c.verb, "--interval", c.interval}, std::string(c.input) + "\n");
+  for (const auto& [verb, interval, input, output] : cases) {
+    const SvyResult r = runSvy({"station", verb, "--interval", interval}, std::string(input) + "\n");
     EXPECT_EQ(r.exitStatus, 0) << r.err;
-    EXPECT_EQ(r.lines().at(1), c.output) << c.verb << ' ' << c.input;
+    EXPECT_EQ(r.lines().at(1), output) << verb << ' ' << input;
   }
 }
 
@@ -347,7 +447,7 @@ TEST(FitVerbs, RecoverTheGeneratingFigures) {
   EXPECT_NEAR(radius.at("rms").get<double>(), 0.005, 1e-9);
 
   // Bad rows are left out of the fit, which is written from the others.
-  const svy_test::SvyResult r = runSvy({"fit", "line"}, "# levels\nn,e\n3,1\n4\n5,2\nx,9\n7,3\n");
+  const SvyResult r = runSvy({"fit", "line"}, "# levels\nn,e\n3,1\n4\n5,2\nx,9\n7,3\n");
   EXPECT_EQ(r.exitStatus, 1);
   EXPECT_EQ(r.out, "slope,intercept,rms\n2.0000000000,1.0000,0.0000\n");
   EXPECT_EQ(r.errLines(), (std::vector<std::string>{"svy: line 4: expected 2 numbers, got 1",
@@ -362,7 +462,7 @@ TEST(FitVerbs, DegeneratePointSetsWriteNoResultRow) {
                   {"line", "1,5\n2,5\n3,5\n", "one easting"},
                   {"line", "", "too few points"}};
   for (const auto& c : failures) {
-    const svy_test::SvyResult r = runSvy({"fit", c.verb}, c.input);
+    const SvyResult r = runSvy({"fit", c.verb}, c.input);
     EXPECT_EQ(r.exitStatus, 1) << c.message;
     EXPECT_LE(r.lines().size(), 1U) << c.message;
     EXPECT_NE(r.err.find(c.message), std::string::npos) << r.err;
@@ -394,7 +494,7 @@ TEST(CurveSolve, EachQuantitySolvesBackToTheCurve) {
 }
 
 TEST(CurveSolve, CircleGeometryAndDegreeOfCurve) {
-  const svy_test::SvyResult csv = runSvy({"curve", "solve", "--full-precision", "--radius", "100", "--delta", "90"});
+  const SvyResult csv = runSvy({"curve", "solve", "--full-precision", "--radius", "100", "--delta", "90"});
   ASSERT_EQ(csv.lines().size(), 2u) << csv.err;
   EXPECT_EQ(csv.lines()[0],
             "radius,deg_curve_arc,deg_curve_chord,delta_deg,length,chord,tangent,external,mid_ordinate");
@@ -473,7 +573,7 @@ TEST(SvyExamples, EverySampleFileReadsWithoutBadRowsAndTheTraverseCloses) {
       {"station", "parse", "--interval", "1000", examplesPath("stations.csv")},
       {"angle", "convert", "--from", "dms", "--to", "deg", examplesPath("angles_dms.csv")}};
   for (const auto& args : runs) {
-    const svy_test::SvyResult r = runSvy(args);
+    const SvyResult r = runSvy(args);
     EXPECT_EQ(r.exitStatus, 0) << args[0] << ' ' << args[1] << ": " << r.err;
     EXPECT_EQ(r.err, "");
     EXPECT_GT(r.lines().size(), 3u) << args[0] << ' ' << args[1];
