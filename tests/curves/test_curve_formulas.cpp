@@ -75,19 +75,17 @@ TEST(CurveFormulas, EveryQuantityRoundTripsAndSatisfiesCircleGeometry) {
     const double R = c.R, delta = c.delta, tol = 1e-9 * std::fmax(1.0, delta), L = GetLengthFromDelta(delta, R);
     const double T = GetTangentFromDelta(delta, R), E = GetExternalFromDelta(delta, R);
     const double C = GetChordLenFromDelta(delta, R), M = GetMidOrdFromDelta(delta, R);
-    EXPECT_NEAR(GetDeltaFromLength(L, R), delta, tol);
-    EXPECT_NEAR(GetDeltaFromChordLength(C, R), delta, 1e-7);
-    EXPECT_NEAR(GetDeltaFromTangent(T, R), delta, tol);
-    EXPECT_NEAR(GetDeltaFromExternal(E, R), delta, 1e-6);
-    EXPECT_NEAR(GetDeltaFromMidOrd(M, R), delta, 1e-6);
+    const double deltas[][2] = {{GetDeltaFromLength(L, R), tol}, {GetDeltaFromChordLength(C, R), 1e-7},
+                                {GetDeltaFromTangent(T, R), tol}, {GetDeltaFromExternal(E, R), 1e-6},
+                                {GetDeltaFromMidOrd(M, R), 1e-6}};
+    for (const auto& d : deltas) EXPECT_NEAR(d[0], delta, d[1]);
     EXPECT_NEAR(GetChordLenFromLength(L, R), C, 1e-9 * R);
     EXPECT_NEAR(GetTangentFromLength(L, R), T, 1e-9 * R);
     EXPECT_NEAR(GetExternalFromLength(L, R), E, 1e-9 * R);
     EXPECT_NEAR(GetMidOrdFromLength(L, R), M, 1e-9 * R);
-    EXPECT_NEAR(GetLengthFromChordLength(C, R), L, 1e-6 * R);
-    EXPECT_NEAR(GetLengthFromTangent(T, R), L, 1e-9 * R);
-    EXPECT_NEAR(GetLengthFromExternal(E, R), L, 1e-6 * R);
-    EXPECT_NEAR(GetLengthFromMidOrd(M, R), L, 1e-6 * R);
+    const double lengths[][2] = {{GetLengthFromChordLength(C, R), 1e-6}, {GetLengthFromTangent(T, R), 1e-9},
+                                 {GetLengthFromExternal(E, R), 1e-6}, {GetLengthFromMidOrd(M, R), 1e-6}};
+    for (const auto& l : lengths) EXPECT_NEAR(l[0], L, l[1] * R);
     EXPECT_NEAR(T * T + R * R, (R + E) * (R + E), 1e-9 * R * R);
     EXPECT_NEAR(R - M, std::sqrt(R * R - C * C / 4.0), 1e-9 * R);
     EXPECT_NEAR(C, 2.0 * T * std::cos(delta * kDegToRad / 2.0), 1e-9 * R);
