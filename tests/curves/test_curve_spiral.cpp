@@ -99,8 +99,7 @@ TEST_P(SpiralData, RoundTripProjectionBoxAndSteps) {
       C2dPos pos;
       ASSERT_TRUE(spiral.getPosAtLengthAndOffset(total * i / 10.0, o, pos));
       ASSERT_TRUE(spiral.getLengthAndOffset(pos, length, offset));
-      EXPECT_NEAR(length, total * i / 10.0, 1e-8);
-      EXPECT_NEAR(offset, o, 1e-8);
+      curve_test::expectPosNear(C2dPos(length, offset), total * i / 10.0, o, 1e-8);
       ASSERT_TRUE(spiral.getShortestDistAndCurveLen(pos.north(), pos.east(), dist, len));
       EXPECT_NEAR(len, total * i / 10.0, 1e-6);
       EXPECT_NEAR(dist, o, 1e-9);
@@ -149,8 +148,7 @@ TEST(SpiralElement, BeyondTheEndsAndLongTangent) {
   endTangent.getPosAlong(0.0008, end, beyond);
   double length = 0.0, offset = 0.0, distance = 0.0;
   ASSERT_TRUE(spiral.getLengthAndOffset(beyond, length, offset));  // within the end tolerance
-  EXPECT_NEAR(length, 100.0008, 1e-9);
-  EXPECT_NEAR(offset, 0.0, 1e-9);
+  curve_test::expectPosNear(C2dPos(length, offset), 100.0008, 0.0, 1e-9);
   endTangent.getPosAlong(5.0, end, beyond);
   EXPECT_FALSE(spiral.getLengthAndOffset(beyond, length, offset));
   // The long tangent of a clothoid: from the start to the tangents' intersection, x_end - y_end / tan(theta).
@@ -161,8 +159,7 @@ TEST(SpiralElement, BeyondTheEndsAndLongTangent) {
   ASSERT_TRUE(spiral.getLengthAndOffset(beyond, length, offset));
   EXPECT_NEAR(length, 105.0, 1e-9);
   ASSERT_TRUE(spiral.getLengthAndOffset(C2dPos(-20.0, 3.0), length, offset));  // behind the start
-  EXPECT_NEAR(length, -20.0, 1e-12);
-  EXPECT_NEAR(offset, 3.0, 1e-12);
+  curve_test::expectPosNear(C2dPos(length, offset), -20.0, 3.0, 1e-12);
   ASSERT_TRUE(spiral.getShortestDistanceToPoint(C2dPos(-20.0, 3.0), distance));
   EXPECT_NEAR(distance, std::hypot(20.0, 3.0), 1e-12);  // to the start point, not the prolonged tangent
 }
@@ -173,10 +170,9 @@ TEST(SpiralDataPart, TangentRadiusStartOffsetRedefinitionAndCopies) {
   CCurveDataSpiral part, full, byRadii, byOffset;
   ASSERT_TRUE(part.setLenAndTwoR(100.0, kInf, 300.0, true, true));
   ASSERT_TRUE(full.setLenAndR(100.0, 300.0, true, true));
-  EXPECT_FALSE(part.isCompoundSpiral());
+  EXPECT_TRUE(!part.isCompoundSpiral() && part.getStartRadius() == 0.0);
   EXPECT_EQ(C2dPos(part.getFinalNorthing(), part.getFinalEasting()),
             C2dPos(full.getFinalNorthing(), full.getFinalEasting()));
-  EXPECT_EQ(part.getStartRadius(), 0.0);
   ASSERT_TRUE(byRadii.setLenAndTwoR(60.0, 500.0, 300.0, true, true));
   ASSERT_TRUE(byOffset.setLenAndR(byRadii.getSimpleSpiral()->getLength(), 300.0, true, true));
   ASSERT_TRUE(byOffset.setStartOffset(byRadii.getStartOffset()));
@@ -184,8 +180,7 @@ TEST(SpiralDataPart, TangentRadiusStartOffsetRedefinitionAndCopies) {
   curve_test::expectPosNear(C2dPos(byOffset.getFinalNorthing(), byOffset.getFinalEasting()),
                             byRadii.getFinalNorthing(), byRadii.getFinalEasting(), 1e-12);
   ASSERT_TRUE(byRadii.setLenAndR(70.0, 300.0, true, true));
-  EXPECT_FALSE(byRadii.isCompoundSpiral());
-  EXPECT_EQ(byRadii.getTotalLength(), 70.0);
+  EXPECT_TRUE(!byRadii.isCompoundSpiral() && byRadii.getTotalLength() == 70.0);
   // A change of the original leaves copies alone, self-assignment keeps the law, a new law the definition.
   CCurveDataSpiral a(eMathSpiralCubic);
   ASSERT_TRUE(a.setLenAndR(100.0, 300.0, true, true));
