@@ -28,29 +28,21 @@ constexpr double kDenormMin = std::numeric_limits<double>::denorm_min();
 
 // Whole-text readers: a failure leaves the output at a sentinel no successful read gives.
 TEST(StringToNumber, ParsesWholeTextOrLeavesOutputAlone) {
-  struct {
-    const wchar_t* text;
-    bool ok;
-    int value;
-  } const ints[] = {{L"+42", true, 42},  {L" \t-17 \n", true, -17}, {L"-2147483648", true, INT_MIN},
-                    {L"2147483648", false, 0}, {L"   ", false, 0}, {L"1.0", false, 0}, {L"1 2", false, 0},
-                    {L"+-1", false, 0}, {L"0x1F", false, 0},      {L"\uFF11", false, 0}};
-  for (const auto& c : ints) {
-    int value = -424242;
-    EXPECT_EQ(svy_formats::StringToInt(CSvyString(c.text), value), c.ok) << CSvyString(c.text).ToNarrow();
-    EXPECT_EQ(value, c.ok ? c.value : -424242) << CSvyString(c.text).ToNarrow();
-  }
-  struct {
-    const wchar_t* text;
-    bool ok;
-    double value;
-  } const doubles[] = {{L"+1.5", true, 1.5}, {L"-.5", true, -0.5}, {L"2.", true, 2.0}, {L"  1.25E-2\t", true, 0.0125},
-                       {L"1,5", false, 0},   {L"1.5.", false, 0},  {L".", false, 0},   {L"1e+", false, 0},
-                       {L"inf", false, 0},   {L"nan", false, 0},   {L"0x1p3", false, 0}, {L"1e400", false, 0}};
-  for (const auto& c : doubles) {
-    double value = -4242.4242;
-    EXPECT_EQ(svy_formats::StringToDouble(CSvyString(c.text), value), c.ok) << CSvyString(c.text).ToNarrow();
-    EXPECT_EQ(value, c.ok ? c.value : -4242.4242) << CSvyString(c.text).ToNarrow();
+  struct { const wchar_t* text; bool intOk, doubleOk; double value; } const cases[] = {
+      {L"+42", true, true, 42},          {L" \t-17 \n", true, true, -17},   {L"-2147483648", true, true, INT_MIN},
+      {L"2147483648", false, true, 2147483648.0}, {L"   ", false, false, 0}, {L"1.0", false, true, 1.0},
+      {L"1 2", false, false, 0},         {L"+-1", false, false, 0},         {L"0x1F", false, false, 0},
+      {L"\uFF11", false, false, 0},      {L"-.5", false, true, -0.5},       {L"2.", false, true, 2.0},
+      {L"  1.25E-2\t", false, true, 0.0125}, {L"1,5", false, false, 0},    {L"1.5.", false, false, 0},
+      {L".", false, false, 0},           {L"1e+", false, false, 0},         {L"inf", false, false, 0},
+      {L"nan", false, false, 0},         {L"0x1p3", false, false, 0},       {L"1e400", false, false, 0}};
+  for (const auto& c : cases) {
+    int i = -424242;
+    double d = -4242.4242;
+    EXPECT_EQ(svy_formats::StringToInt(CSvyString(c.text), i), c.intOk) << CSvyString(c.text).ToNarrow();
+    EXPECT_EQ(svy_formats::StringToDouble(CSvyString(c.text), d), c.doubleOk) << CSvyString(c.text).ToNarrow();
+    EXPECT_EQ(i, c.intOk ? static_cast<int>(c.value) : -424242) << CSvyString(c.text).ToNarrow();
+    EXPECT_EQ(d, c.doubleOk ? c.value : -4242.4242) << CSvyString(c.text).ToNarrow();
   }
 }
 
