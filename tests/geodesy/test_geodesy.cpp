@@ -12,7 +12,10 @@
 #include <limits>
 #include <random>
 #include <utility>
+#include <vector>
 
+#include "support/csv.h"
+#include "support/refdata.h"
 #include "svymath/foundation/angle_functions.h"
 #include "svymath/foundation/constants.h"
 #include "svymath/foundation/math_angle.h"
@@ -74,6 +77,27 @@ TEST(GeodeticCartesian, MatchesIndependentLibraryOverGlobalGrid) {
 // The equator on the prime meridian (exactly on the X axis both ways); the centre of the earth (h = -a); the
 // polar axis, within 1e-10 m of it, where the height is |Z| - b; a western longitude, which comes back
 // increased by 2 pi.
+// 516 points computed independently for the stored eccentricity (columns *_e0818191913305) and for the usual
+// flattening (*_wgs84): the stored decimal e puts positions 0.1 to 0.5 mm from the usual ellipsoid, and this
+// table pins which of the two the library uses. It stays in the shared reference folder (optional).
+TEST(GeodeticCartesian, MatchesReferenceTableForTheStoredEccentricity) {
+  SVY_SKIP_WITHOUT_REFDATA();
+  const svy_test::CsvTable t = svy_test::readCsvTable(svy_test::refdataPath("geodetic/geodetic_ecef_cartconvert.csv"));
+  ASSERT_EQ(t.rows.size(), 516u);
+  double largestEllipsoidDifference = 0.0;
+  for (const auto& row : t.rows) {
+    const Coord expected(row[t.column("X_e0818191913305")], row[t.column("Y_e0818191913305")],
+                         row[t.column("Z_e0818191913305")]);
+    const Coord c = toCartesian(row[t.column("lat_deg")], row[t.column("lon_deg")], row[t.column("h_m")]);
+    ASSERT_LT(distance(c, expected), kForwardTol) << row[0] << " " << row[1] << " " << row[2];
+    ASSERT_LT(distance(Coord().blh2xyz(toGeodetic(expected)), expected), kReverseTol);
+    const Coord usual(row[t.column("X_wgs84")], row[t.column("Y_wgs84")], row[t.column("Z_wgs84")]);
+    largestEllipsoidDifference = std::max(largestEllipsoidDifference, distance(c, usual));
+  }
+  EXPECT_GT(largestEllipsoidDifference, 1e-4);
+  EXPECT_LT(largestEllipsoidDifference, 1e-3);
+}
+
 TEST(GeodeticCartesian, SpecialPositions) {
   EXPECT_EQ(toCartesian(0.0, 0.0, 0.0), Coord(6378137.0, 0.0, 0.0));
   const double b = std::sqrt(1.0 - 0.0818191913305 * 0.0818191913305) * 6378137.0;
@@ -334,6 +358,34 @@ TEST(GpsTimeCalendar, EveryDayOfTheValidRangeMatchesIndependentDayCount) {
 
 // Inputs that cannot name a day give undefined results (NaN seconds, zero fields), never a table read
 // out of bounds, an integer overflow or a hang.
+// Generated calendar/GPS pairs: the epoch, week ends, day 366, both week-number rollovers (1999-08-22,
+// 2019-04-07), 2099-12-31 and fractional seconds, both directions. Rows before the epoch use floor-divided
+// weeks, which this library truncates toward zero instead; they are left to the day-count sweep.
+TEST(GpsTimeCalendar, MatchesGeneratedVectorsIncludingWeekRollovers) {
+  const svy_test::CsvTable t = svy_test::readCsvTable(svy_test::testdataPath("geodesy/gps_week_sow_vectors.csv"));
+  ASSERT_GT(t.rows.size(), 60u);
+  for (const auto& r : t.rows) {
+    if (r[t.column("seconds_since_gps_epoch")] < 0.0) continue;
+    const int year = static_cast<int>(r[t.column("year")]), month = static_cast<int>(r[t.column("month")]);
+    const int day = static_cast<int>(r[t.column("day")]), hour = static_cast<int>(r[t.column("hour")]);
+    const int minute = static_cast<int>(r[t.column("minute")]);
+    const double second = r[t.column("second")];
+    SCOPED_TRACE(testing::Message() << year << "-" << month << "-" << day << " " << hour << ":" << minute);
+    int week = -1;
+    double sow = -1.0;
+    ymdhms_to_gps(year, month, day, hour, minute, second, &week, &sow);
+    EXPECT_EQ(week, static_cast<int>(r[t.column("gps_week")]));
+    EXPECT_NEAR(sow, r[t.column("seconds_of_week")], 1e-6);
+    int y = 0, mo = 0, d = 0, h = 0, mi = 0, doy = 0;
+    double s = -1.0;
+    gps_to_ymdhms(week, sow, &y, &mo, &d, &h, &mi, &s);
+    EXPECT_EQ(std::vector<int>({y, mo, d, h, mi}), std::vector<int>({year, month, day, hour, minute}));
+    EXPECT_NEAR(s, second, 1e-6);
+    mday_to_yday(year, month, day, &doy);
+    EXPECT_EQ(doy, static_cast<int>(r[t.column("day_of_year")]));
+  }
+}
+
 TEST(GpsTimeCalendar, InputsThatNameNoDayGiveUndefinedResults) {
   const int calendarCases[][3] = {
       {2020, 0, 1}, {2020, 13, 1}, {2020, INT_MAX, 1}, {INT_MAX, 12, 31}, {INT_MIN, 12, 31}};
