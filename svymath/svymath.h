@@ -60,3 +60,6 @@
 #include "svymath/formats/sign_strings.h"
 #include "svymath/formats/bearing_text.h"
 #include "svymath/formats/angle_text.h"
+#include "svymath/formats/number_display_text.h"
+#include "svymath/formats/integer_text.h"
+#include "svymath/formats/degree_display_text.h"
