@@ -50,6 +50,7 @@
 #include "svymath/adjustment/coord_cov.h"
 #include "svymath/adjustment/weighted_average.h"
 #include "svymath/adjustment/least_squares.h"
+#include "svymath/adjustment/lsq_matrix_helpers.h"
 #include "svymath/adjustment/best_fit.h"
 #include "svymath/adjustment/fit_quality.h"
 #include "svymath/geodesy/ellipsoid.h"
