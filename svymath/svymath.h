@@ -14,6 +14,7 @@
 #include "svymath/cogo/inverse_radiate.h"
 #include "svymath/cogo/implicit_lines.h"
 #include "svymath/cogo/circle_solvers.h"
+#include "svymath/cogo/view_cone.h"
 #include "svymath/formats/station_text.h"
 #include "svymath/formats/dms_text.h"
 #include "svymath/formats/round_double.h"
