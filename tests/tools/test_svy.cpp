@@ -139,15 +139,29 @@ TEST(AngleConvert, KnownValuesQuirksAndRoundTrips) {
   EXPECT_EQ(runSvy({"angle", "convert", "--from", "deg", "--to", "dms"}, "12.9999999\n13.0\n").out,
             "value\n12.59599996\n13.00000000\n");
   const double degrees[] = {0.5, 123.456789, -45.25, 359.9999};
-  for (const char* unit : {"rad", "grad", "mil", "dms"}) {
+  for (const char* unit : {"rad", "grad", "mil", "dms", "dmm", "deg-text", "dms-text", "dmm-text"}) {
     const std::string there = runSvy({"--full-precision", "angle", "convert", "--from", "deg", "--to", unit},
                                      "0.5\n123.456789\n-45.25\n359.9999\n")
                                   .out;
     const nlohmann::json back = runJson({"angle", "convert", "--from", unit, "--to", "deg"}, there);
-    ASSERT_EQ(back.size(), 4u) << unit;
+    ASSERT_EQ(back.size(), 4u) << unit << '\n' << there;
     // The packed form keeps seconds to 8 decimals (3e-12 degree).
     for (std::size_t i = 0; i < 4; ++i) EXPECT_NEAR(back[i]["value"].get<double>(), degrees[i], 1e-11) << unit;
   }
+}
+
+// The text forms and the packed DD.MMmm number: known texts and a bad row among good ones (their round
+// trips are in KnownValuesQuirksAndRoundTrips).
+TEST(AngleConvert, TextFormsAndPackedMinutes) {
+  EXPECT_EQ(runSvy({"angle", "convert", "--from", "deg", "--to", "dms-text"}, "45.50423611111111\n-0.5\n").out,
+            "value\n\"45\u00B030'15.2500\"\"\"\n\"-0\u00B030'00.0000\"\"\"\n");
+  EXPECT_EQ(runSvy({"angle", "convert", "--from", "deg", "--to", "deg-text"}, "12.5\n").out, "value\n12.5\u00B0\n");
+  EXPECT_EQ(runSvy({"angle", "convert", "--from", "deg", "--to", "dmm"}, "-12.0833333333333333\n").out,
+            "value\n-12.05000000\n");
+  const SvyResult mixed = runSvy({"angle", "convert", "--from", "dmm", "--to", "deg"}, "45.30254\n45.60\n7.3\n");
+  EXPECT_EQ(mixed.exitStatus, 1);
+  EXPECT_EQ(mixed.out, "value\n45.504233333\n7.500000000\n");
+  EXPECT_EQ(mixed.err, "svy: line 2: value: '45.60' is not a dmm angle\n");
 }
 
 // svy units convert: published unit definitions, the deliberate asymmetries of the factors, and round trips.
