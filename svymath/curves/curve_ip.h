@@ -1,0 +1,108 @@
+#pragma once
+// The curve group about an intersection point (IP), as road designers lay it out: an entry transition
+// spiral (TS to SC), a circular arc (SC to CS) and an exit spiral (CS to ST) between the tangent that
+// arrives at the IP and the tangent that leaves it. Either spiral may have length zero, so a plain circular
+// curve is a case of it; radius zero with no spirals is a bare angle point (the tangents meet at the IP).
+//
+// The group is defined by the IP, the radius and the two spiral lengths; its tangents come from the
+// previous and next intersection points (setNeighbours), so it is recomputed whenever a neighbour moves.
+// The direction of turn follows from the tangents: the signed values read back (radius, deflection) are
+// positive turning right (clockwise), as everywhere in the library.
+//
+// Lengths are measured along the group from TS (0) to ST (getTotalLength()), with the element end snap
+// (tol::kSnap); azimuths returned as doubles are decimal degrees.
+#include "svymath/curves/curve_arc.h"
+#include "svymath/curves/curve_spiral.h"
+#include "svymath/curves/spiral_type.h"
+#include "svymath/foundation/class_new.h"
+#include "svymath/foundation/positions.h"
+#include "svymath/foundation/rtti.h"
+
+class CGenericSegmentVisitor_const;
+
+class SVYMATH_API CCurveIp : public virtual CRttiBase {
+  SVY_RTTI_DECLARE(CCurveIp)
+
+ public:
+  SVY_CLASS_NEW_DELETE
+
+  // Undefined (isok() false) until setIp and setNeighbours have both succeeded.
+  CCurveIp();
+  CCurveIp(const CCurveIp& other);
+  CCurveIp& operator=(const CCurveIp& other);
+  ~CCurveIp() override;
+
+  // ---- definition ----
+  // The group about the intersection point (ipNorth, ipEast) with an arc of the given radius (metres, its
+  // sign is ignored: the turn comes from the tangents), an entry spiral of length lenIn and an exit spiral
+  // of length lenOut (metres, >= 0). False, leaving the group unchanged, for non-finite or negative values,
+  // or spirals with a zero radius.
+  bool setIp(double ipNorth, double ipEast, double radius, double lenIn, double lenOut);
+  // A bare angle point at the current IP: radius 0, no spirals.
+  void setSimplePoint();
+  bool isSimplePoint() const;
+  // The law of both spirals (clothoid by default).
+  void setSpiralType(AlntMathSpiralType type);
+  AlntMathSpiralType getSpiralType() const;
+  // The tangents: from the previous intersection point (or the alignment's start) to the IP, and from the
+  // IP to the next intersection point (or the alignment's end). Recomputes the parts. False, and the group
+  // undefined, when a neighbour coincides with the IP, when the spirals do not fit the deflection (their
+  // turning angles lenIn/2R + lenOut/2R exceed it), or when the tangents are parallel while a curve is
+  // asked for. A simple point needs only distinct neighbours.
+  bool setNeighbours(const C2dPos& previous, const C2dPos& next);
+  bool isok() const;
+  bool isEqual(const CCurveIp& other) const;
+
+  // ---- read back ----
+  C2dPos getIp() const;
+  double getRadius() const;         // signed: positive turning right; 0 for a simple point
+  double getLenIn() const;          // entry spiral length (metres)
+  double getLenOut() const;         // exit spiral length (metres)
+  double getDeflection() const;     // signed turn of the tangents at the IP (radians, positive right)
+  double getTangentIn() const;      // distance TS to IP (metres)
+  double getTangentOut() const;     // distance IP to ST (metres)
+  double getShiftIn() const;        // shift of the arc from the entry tangent (metres)
+  double getShiftOut() const;       // shift of the arc from the exit tangent (metres)
+  C2dPos getTS() const;
+  C2dPos getSC() const;
+  C2dPos getCS() const;
+  C2dPos getST() const;
+  double getTotalLength() const;    // lenIn + arc length + lenOut (0 for a simple point)
+  // The parts, null where a part has no length.
+  const CCurveSpiral* getSpiralIn() const;
+  const CCurveArc* getArc() const;
+  const CCurveSpiral* getSpiralOut() const;
+
+  // ---- queries over the group, from TS ----
+  bool getStartAzimut(CMathAngle& azimuth) const;
+  bool getEndAzimut(CMathAngle& azimuth) const;
+  bool getPosAtLength(double length, double& north, double& east) const;
+  bool getAzimuthAtLength(double length, CMathAngle& azimuth) const;
+  double getCurvatureAtLength(double length) const;
+  // The length and offset (positive right) of the point's foot on the group; false when it has none.
+  bool getLengthAndOffset(double north, double east, double& length, double& offset) const;
+  bool getShortestDistanceToPoint(double north, double east, double& distance) const;
+  bool getShortestDistAndCurveLen(double north, double east, double& dist, double& len) const;
+  double getStepForDeviation(double length, double deviation) const;
+  C2dMinMax getBoundary() const;
+  // Hands the parts that have length to the visitor, in order of travel.
+  void ForEachSegment(CGenericSegmentVisitor_const& visitor) const;
+
+ private:
+  // Rebuilds the parts from the definition and the stored neighbours.
+  bool rebuild();
+
+  C2dPos m_ip;
+  C2dPos m_previous;
+  C2dPos m_next;
+  double m_radius;
+  double m_lenIn;
+  double m_lenOut;
+  AlntMathSpiralType m_spiralType;
+  bool m_neighboursSet;
+  bool m_ok;
+  double m_deflection;
+  CCurveSpiral m_spiralIn;
+  CCurveArc m_arc;
+  CCurveSpiral m_spiralOut;
+};
