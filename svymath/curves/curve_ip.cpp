@@ -146,6 +146,8 @@ bool CCurveIp::setNeighbours(const C2dPos& previous, const C2dPos& next) {
 
 bool CCurveIp::isok() const { return m_ok; }
 
+ECurveIpStatus CCurveIp::getStatus() const { return m_status; }
+
 bool CCurveIp::isEqual(const CCurveIp& other) const {
   return samePos(m_ip, other.m_ip) && m_radius == other.m_radius && m_lenIn == other.m_lenIn &&
          m_lenOut == other.m_lenOut && m_spiralType == other.m_spiralType &&
@@ -156,6 +158,7 @@ bool CCurveIp::isEqual(const CCurveIp& other) const {
 void CCurveIp::clearComputed() {
   const double nan = svy_math::undefinedValue();
   m_ok = false;
+  m_status = eCurveIpUndefined;
   m_deflection = nan;
   m_azIn.reset();
   m_azOut.reset();
@@ -180,6 +183,7 @@ bool CCurveIp::rebuild() {
       !m_azIn.setAz(inN, inE) || !m_azOut.setAz(outN, outE)) {
     m_azIn.reset();
     m_azOut.reset();
+    m_status = eCurveIpNoTangent;
     return false;
   }
   const double deflection = NormalizeNegPiToPi(m_azOut.getRad() - m_azIn.getRad());
@@ -189,17 +193,25 @@ bool CCurveIp::rebuild() {
     m_tangentIn = m_tangentOut = m_shiftIn = m_shiftOut = m_arcLength = 0.0;
     m_ts = m_sc = m_cs = m_st = m_ip;
     m_ok = true;
+    m_status = eCurveIpOk;
     return true;
   }
   const double halfTurnTol = svy_math::tol::kHalfTurnDeg * svy_math::units::kDegToRad;
   TSpiralFit in;
   TSpiralFit out;
-  if (turn < kZero || svy_math::units::kPi - turn < halfTurnTol || !fitSpiral(m_spiralType, m_lenIn, m_radius, in) ||
-      !fitSpiral(m_spiralType, m_lenOut, m_radius, out)) {
+  if (turn < kZero || svy_math::units::kPi - turn < halfTurnTol) {
+    m_status = turn < kZero ? eCurveIpCollinear : eCurveIpReversal;
+    return false;
+  }
+  if (!fitSpiral(m_spiralType, m_lenIn, m_radius, in) || !fitSpiral(m_spiralType, m_lenOut, m_radius, out)) {
+    m_status = eCurveIpSpiralUnreachable;
     return false;
   }
   double arcAngle = turn - in.angle - out.angle;
-  if (arcAngle <= -kZero) return false;  // the spirals turn further than the tangents
+  if (arcAngle <= -kZero) {
+    m_status = eCurveIpSpiralsTooLong;
+    return false;
+  }
   if (arcAngle < kZero) arcAngle = 0.0;  // spirals that fill the turn meet at one point of radius R
 
   const double R = m_radius;
@@ -226,7 +238,7 @@ bool CCurveIp::rebuild() {
   m_cs = offsetFrom(m_ip, cs);
   m_st = offsetFrom(m_ip, st);
   if (!isFinite(m_ts) || !isFinite(m_sc) || !isFinite(m_cs) || !isFinite(m_st)) {
-    clearComputed();
+    clearComputed();  // absurd input (1e300): no finite group
     return false;
   }
 
@@ -245,6 +257,7 @@ bool CCurveIp::rebuild() {
     m_spiralOut = CCurveSpiral(m_cs.north(), m_cs.east(), azCs, spiral);
   }
   m_ok = true;
+  m_status = eCurveIpOk;
   return true;
 }
 

@@ -36,6 +36,17 @@
 
 class CGenericSegmentVisitor_const;
 
+// Why a group is or is not defined (getStatus).
+enum ECurveIpStatus : int {
+  eCurveIpOk = 0,
+  eCurveIpUndefined = 1,         // setIp or setNeighbours not yet given, or a group beyond finite numbers
+  eCurveIpNoTangent = 2,         // a neighbour coincides with the IP
+  eCurveIpCollinear = 3,         // the tangents run straight on: no curve to fit
+  eCurveIpReversal = 4,          // the tangents turn back on themselves: infinite tangent lengths
+  eCurveIpSpiralUnreachable = 5, // the spiral law cannot reach the radius within the spiral length
+  eCurveIpSpiralsTooLong = 6,    // the spirals turn further than the tangents
+};
+
 class SVYMATH_API CCurveIp : public virtual CRttiBase {
   SVY_RTTI_DECLARE(CCurveIp)
 
@@ -69,6 +80,8 @@ class SVYMATH_API CCurveIp : public virtual CRttiBase {
   // asked for. A simple point needs only distinct neighbours.
   bool setNeighbours(const C2dPos& previous, const C2dPos& next);
   bool isok() const;
+  // eCurveIpOk when isok(); otherwise the reason.
+  ECurveIpStatus getStatus() const;
   bool isEqual(const CCurveIp& other) const;
 
   // ---- read back ----
@@ -141,6 +154,7 @@ class SVYMATH_API CCurveIp : public virtual CRttiBase {
   bool m_neighboursSet;
   bool m_ok;
   // Computed by rebuild().
+  ECurveIpStatus m_status;
   double m_deflection;
   CMathAngle m_azIn;   // previous -> IP
   CMathAngle m_azOut;  // IP -> next

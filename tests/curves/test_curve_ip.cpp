@@ -257,19 +257,21 @@ TEST(CurveIpFailures, SpiralsBeyondTheDeflectionAndDegenerateTangents) {
   const struct {
     double defl, radius, lenIn, lenOut;
     AlntMathSpiralType type;
+    ECurveIpStatus status;
   } cases[] = {
-      {20.0, 300.0, 120.0, 90.0, eMathSpiralEuler},   // 0.2 + 0.15 rad of spiral in 0.349 rad
-      {-10.0, 100.0, 40.0, 0.0, eMathSpiralEuler},    // 0.2 rad in 0.1745
-      {0.0, 300.0, 0.0, 0.0, eMathSpiralEuler},       // collinear tangents: no curve
-      {180.0, 300.0, 0.0, 0.0, eMathSpiralEuler},     // reversal
-      {-179.999999, 300.0, 0.0, 0.0, eMathSpiralEuler},
-      {60.0, 100.0, 80.0, 0.0, eMathSpiralCubic},     // no cubic parabola is that sharp
+      {20.0, 300.0, 120.0, 90.0, eMathSpiralEuler, eCurveIpSpiralsTooLong},  // 0.2 + 0.15 rad in 0.349 rad
+      {-10.0, 100.0, 40.0, 0.0, eMathSpiralEuler, eCurveIpSpiralsTooLong},   // 0.2 rad in 0.1745
+      {0.0, 300.0, 0.0, 0.0, eMathSpiralEuler, eCurveIpCollinear},
+      {180.0, 300.0, 0.0, 0.0, eMathSpiralEuler, eCurveIpReversal},
+      {-179.999999, 300.0, 0.0, 0.0, eMathSpiralEuler, eCurveIpReversal},
+      {60.0, 100.0, 80.0, 0.0, eMathSpiralCubic, eCurveIpSpiralUnreachable},  // no cubic parabola that sharp
+      {120.0, 1e308, 0.0, 0.0, eMathSpiralEuler, eCurveIpUndefined},          // tangents beyond the doubles
   };
   for (const auto& c : cases) {
     bool fits = true;
     const CCurveIp g = makeGroup(kSurveyN, kSurveyE, 15.0, c.defl, c.radius, c.lenIn, c.lenOut, c.type, &fits);
     EXPECT_FALSE(fits) << c.defl;
-    EXPECT_FALSE(g.isok());
+    EXPECT_TRUE(!g.isok() && g.getStatus() == c.status) << g.getStatus();
     double n = 0.0, e = 0.0;
     EXPECT_FALSE(g.getPosAtLength(0.0, n, e));
     EXPECT_TRUE(std::isnan(g.getTotalLength()) && std::isnan(g.getTS().north()) && g.getArc() == nullptr);
@@ -284,7 +286,7 @@ TEST(CurveIpFailures, SpiralsBeyondTheDeflectionAndDegenerateTangents) {
   EXPECT_FALSE(g.setIp(100.0, 200.0, 0.0, 10.0, 0.0));  // spirals need a radius
   EXPECT_TRUE(g.isok() && g.getTotalLength() == length && g.getLenIn() == 50.0);
   EXPECT_FALSE(g.setNeighbours(C2dPos(100.0, 200.0), C2dPos(300.0, 200.0)));
-  EXPECT_FALSE(g.isok());
+  EXPECT_TRUE(!g.isok() && g.getStatus() == eCurveIpNoTangent);
 }
 
 // A bare angle point: no length, TS = ST = IP; only the wedge outside the angle has its foot there, on the
