@@ -62,15 +62,39 @@ bool samePos(const C2dPos& a, const C2dPos& b) {
   return sameValue(a.north(), b.north()) && sameValue(a.east(), b.east());
 }
 
-// Asks query(part, length, value) of each part in order and keeps the answer with the smallest |value|; a
-// later part within tie of the best replaces it. length is the group length (the part's start added).
+// Distance from (north, east) to the box (0 inside it).
+double boxDistance(const C2dMinMax& box, double north, double east) {
+  const double dN = std::fmax(std::fmax(box.minNorth - north, north - box.maxNorth), 0.0);
+  const double dE = std::fmax(std::fmax(box.minEast - east, east - box.maxEast), 0.0);
+  return std::hypot(dN, dE);
+}
+
+// Asks query(segment, length, value) of each part in order and keeps the answer with the smallest |value|;
+// a later part within tie of the best replaces it. length is the group length (the part's start added).
+//
+// The part nearest to the point by its box is asked first. Its |value| bounds the answer: with at most three
+// parts the tie rule lets the answer drift at most two ties above the smallest |value|, so a part whose box
+// lies farther than that (plus slack for answers a part gives beyond its ends) cannot hold it and is not
+// asked. The result is the same as asking every part.
 template <class Part, class Query>
-bool nearestOverParts(const Part* parts, int count, double tie, const Query& query, double& length, double& value) {
+bool nearestOverParts(const Part* parts, int count, double tie, double slack, double north, double east,
+                      const Query& query, double& length, double& value) {
+  double gaps[3] = {0.0, 0.0, 0.0};
+  int first = 0;
+  for (int i = 0; i < count; ++i) {
+    gaps[i] = boxDistance(*parts[i].box, north, east);
+    if (gaps[i] < gaps[first]) first = i;
+  }
+  double firstLength = 0.0;
+  double firstValue = 0.0;
+  const bool firstFound = count > 0 && query(*parts[first].segment, firstLength, firstValue);
+  const double reach = firstFound ? std::fabs(firstValue) + 2.0 * tie + slack : HUGE_VAL;
   bool found = false;
   for (int i = 0; i < count; ++i) {
-    double s = 0.0;
-    double v = 0.0;
-    if (query(*parts[i].segment, s, v) && (!found || std::fabs(v) <= std::fabs(value) + tie)) {
+    double s = firstLength;
+    double v = firstValue;
+    const bool has = i == first ? firstFound : gaps[i] <= reach && query(*parts[i].segment, s, v);
+    if (has && (!found || std::fabs(v) <= std::fabs(value) + tie)) {
       length = parts[i].start + s;
       value = v;
       found = true;
@@ -171,6 +195,7 @@ void CCurveIp::clearComputed() {
   m_spiralIn = CCurveSpiral();
   m_arc = CCurveArc();
   m_spiralOut = CCurveSpiral();
+  m_boxIn = m_boxArc = m_boxOut = C2dMinMax();
 }
 
 bool CCurveIp::rebuild() {
@@ -256,6 +281,9 @@ bool CCurveIp::rebuild() {
     spiral.setLenAndR(m_lenOut, R, right, false);
     m_spiralOut = CCurveSpiral(m_cs.north(), m_cs.east(), azCs, spiral);
   }
+  m_boxIn = m_spiralIn.getBoundary();
+  m_boxArc = m_arc.getBoundary();
+  m_boxOut = m_spiralOut.getBoundary();
   m_ok = true;
   m_status = eCurveIpOk;
   return true;
@@ -289,9 +317,9 @@ const CCurveSpiral* CCurveIp::getSpiralOut() const { return m_ok && m_lenOut > 0
 
 int CCurveIp::parts(TPart (&out)[3]) const {
   int count = 0;
-  if (const CCurveSpiral* in = getSpiralIn()) out[count++] = {in, 0.0};
-  if (const CCurveArc* arc = getArc()) out[count++] = {arc, m_lenIn};
-  if (const CCurveSpiral* exit = getSpiralOut()) out[count++] = {exit, m_lenIn + m_arcLength};
+  if (const CCurveSpiral* in = getSpiralIn()) out[count++] = {in, 0.0, &m_boxIn};
+  if (const CCurveArc* arc = getArc()) out[count++] = {arc, m_lenIn, &m_boxArc};
+  if (const CCurveSpiral* exit = getSpiralOut()) out[count++] = {exit, m_lenIn + m_arcLength, &m_boxOut};
   return count;
 }
 
@@ -378,9 +406,10 @@ bool CCurveIp::getLengthAndOffset(double north, double east, double& length, dou
   }
   TPart list[3];
   const int count = parts(list);
-  // A later part within the tie distance of the best takes over: a joint belongs to the later part.
+  // A later part within the tie distance of the best takes over: a joint belongs to the later part. A part
+  // answers up to the snap beyond its ends, where its foot may lie that far outside its box.
   return nearestOverParts(
-      list, count, kSnap,
+      list, count, kSnap, kSnap, north, east,
       [&](const CGenericSegment& part, double& s, double& off) { return part.getLengthAndOffset(north, east, s, off); },
       length, offset);
 }
@@ -400,7 +429,7 @@ bool CCurveIp::getShortestDistAndCurveLen(double north, double east, double& dis
     return spiral != nullptr ? spiral->getShortestDistAndCurveLen(north, east, d, s)
                              : arc != nullptr && arc->getShortestDistAndCurveLen(north, east, d, s);
   };
-  return nearestOverParts(list, count, 0.0, nearest, len, dist);
+  return nearestOverParts(list, count, 0.0, 0.0, north, east, nearest, len, dist);
 }
 
 bool CCurveIp::getShortestDistanceToPoint(double north, double east, double& distance) const {
@@ -426,7 +455,7 @@ C2dMinMax CCurveIp::getBoundary() const {
   }
   TPart list[3];
   const int count = parts(list);
-  for (int i = 0; i < count; ++i) box.include(list[i].segment->getBoundary());
+  for (int i = 0; i < count; ++i) box.include(*list[i].box);
   return box;
 }
 

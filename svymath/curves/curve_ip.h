@@ -132,10 +132,11 @@ class SVYMATH_API CCurveIp : public virtual CRttiBase {
   bool rebuild();
   // Makes the computed values undefined.
   void clearComputed();
-  // The parts that have length, in order of travel, with the group length where each begins.
+  // The parts that have length, in order of travel, with the group length where each begins and its box.
   struct TPart {
     const CGenericSegment* segment;
     double start;
+    const C2dMinMax* box;
   };
   int parts(TPart (&out)[3]) const;
   // The part holding group length s (at a joint the later one; before the start the first, after the end
@@ -170,4 +171,7 @@ class SVYMATH_API CCurveIp : public virtual CRttiBase {
   CCurveSpiral m_spiralIn;
   CCurveArc m_arc;
   CCurveSpiral m_spiralOut;
+  C2dMinMax m_boxIn;
+  C2dMinMax m_boxArc;
+  C2dMinMax m_boxOut;
 };

@@ -211,6 +211,32 @@ TEST_P(CurveIpGroup, RoundTripsSurveyCoordinatesAndMirror) {
   const C2dPos before = at(g.getTS(), 0.0, -10.0);
   double length = 0.0, offset = 0.0;
   EXPECT_FALSE(g.getLengthAndOffset(before.north(), before.east(), length, offset));
+  // Over a grid around the group, the search (which skips parts whose box is too far) answers as asking
+  // every part in order, the later one winning within 1 mm.
+  const C2dMinMax box = g.getBoundary();
+  const double gridN = box.maxNorth - box.minNorth + 100.0, gridE = box.maxEast - box.minEast + 100.0;
+  for (int i = 0; i <= 40; ++i) {
+    for (int j = 0; j <= 40; ++j) {
+      const double n = box.minNorth - 50.0 + gridN * i / 40.0, e = box.minEast - 50.0 + gridE * j / 40.0;
+      bool expected = false;
+      double expLength = 0.0, expOffset = 0.0, start = 0.0;
+      for (const CGenericSegment* part : {static_cast<const CGenericSegment*>(g.getSpiralIn()),
+                                          static_cast<const CGenericSegment*>(g.getArc()),
+                                          static_cast<const CGenericSegment*>(g.getSpiralOut())}) {
+        double s = 0.0, off = 0.0;
+        if (part != nullptr && part->getLengthAndOffset(n, e, s, off) &&
+            (!expected || std::fabs(off) <= std::fabs(expOffset) + 1e-3)) {
+          expected = true;
+          expLength = start + s;
+          expOffset = off;
+        }
+        if (part != nullptr) start += part->getTotalLength();
+      }
+      const bool found = g.getLengthAndOffset(n, e, length, offset);
+      ASSERT_EQ(found, expected) << n << " " << e;
+      EXPECT_TRUE(!found || (length == expLength && offset == expOffset)) << n << " " << e;
+    }
+  }
 }
 
 // Stepping by chord deviation walks through the joints to ST; the box holds the group; the parts are handed
