@@ -42,9 +42,7 @@ void BM_CurveIpLengthAndOffsetClothoid(benchmark::State& state) {
   lengthAndOffset(state, eMathSpiralEuler, 120.0, 80.0);
 }
 void BM_CurveIpLengthAndOffsetCubic(benchmark::State& state) { lengthAndOffset(state, eMathSpiralCubic, 120.0, 80.0); }
-void BM_CurveIpLengthAndOffsetPlainArc(benchmark::State& state) {
-  lengthAndOffset(state, eMathSpiralEuler, 0.0, 0.0);
-}
+void BM_CurveIpLengthAndOffsetPlainArc(benchmark::State& state) { lengthAndOffset(state, eMathSpiralEuler, 0.0, 0.0); }
 
 }  // namespace
 

@@ -174,8 +174,7 @@ ECurveIpStatus CCurveIp::getStatus() const { return m_status; }
 
 bool CCurveIp::isEqual(const CCurveIp& other) const {
   return samePos(m_ip, other.m_ip) && m_radius == other.m_radius && m_lenIn == other.m_lenIn &&
-         m_lenOut == other.m_lenOut && m_spiralType == other.m_spiralType &&
-         m_neighboursSet == other.m_neighboursSet &&
+         m_lenOut == other.m_lenOut && m_spiralType == other.m_spiralType && m_neighboursSet == other.m_neighboursSet &&
          (!m_neighboursSet || (samePos(m_previous, other.m_previous) && samePos(m_next, other.m_next)));
 }
 
@@ -305,9 +304,7 @@ C2dPos CCurveIp::getSC() const { return m_sc; }
 C2dPos CCurveIp::getCS() const { return m_cs; }
 C2dPos CCurveIp::getST() const { return m_st; }
 
-double CCurveIp::getTotalLength() const {
-  return m_ok ? m_lenIn + m_arcLength + m_lenOut : svy_math::undefinedValue();
-}
+double CCurveIp::getTotalLength() const { return m_ok ? m_lenIn + m_arcLength + m_lenOut : svy_math::undefinedValue(); }
 
 const CCurveSpiral* CCurveIp::getSpiralIn() const { return m_ok && m_lenIn > 0.0 ? &m_spiralIn : nullptr; }
 const CCurveArc* CCurveIp::getArc() const { return m_ok && m_arcLength > 0.0 ? &m_arc : nullptr; }

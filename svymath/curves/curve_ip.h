@@ -39,12 +39,12 @@ class CGenericSegmentVisitor_const;
 // Why a group is or is not defined (getStatus).
 enum ECurveIpStatus : int {
   eCurveIpOk = 0,
-  eCurveIpUndefined = 1,         // setIp or setNeighbours not yet given, or a group beyond finite numbers
-  eCurveIpNoTangent = 2,         // a neighbour coincides with the IP
-  eCurveIpCollinear = 3,         // the tangents run straight on: no curve to fit
-  eCurveIpReversal = 4,          // the tangents turn back on themselves: infinite tangent lengths
-  eCurveIpSpiralUnreachable = 5, // the spiral law cannot reach the radius within the spiral length
-  eCurveIpSpiralsTooLong = 6,    // the spirals turn further than the tangents
+  eCurveIpUndefined = 1,          // setIp or setNeighbours not yet given, or a group beyond finite numbers
+  eCurveIpNoTangent = 2,          // a neighbour coincides with the IP
+  eCurveIpCollinear = 3,          // the tangents run straight on: no curve to fit
+  eCurveIpReversal = 4,           // the tangents turn back on themselves: infinite tangent lengths
+  eCurveIpSpiralUnreachable = 5,  // the spiral law cannot reach the radius within the spiral length
+  eCurveIpSpiralsTooLong = 6,     // the spirals turn further than the tangents
 };
 
 class SVYMATH_API CCurveIp : public virtual CRttiBase {
