@@ -221,12 +221,12 @@ bool CCurveIp::rebuild() {
     return true;
   }
   const double halfTurnTol = svy_math::tol::kHalfTurnDeg * svy_math::units::kDegToRad;
-  TSpiralFit in;
-  TSpiralFit out;
   if (turn < kZero || svy_math::units::kPi - turn < halfTurnTol) {
     m_status = turn < kZero ? eCurveIpCollinear : eCurveIpReversal;
     return false;
   }
+  TSpiralFit in;
+  TSpiralFit out;
   if (!fitSpiral(m_spiralType, m_lenIn, m_radius, in) || !fitSpiral(m_spiralType, m_lenOut, m_radius, out)) {
     m_status = eCurveIpSpiralUnreachable;
     return false;
@@ -249,6 +249,9 @@ bool CCurveIp::rebuild() {
   m_shiftOut = out.shift;
   m_arcLength = R * arcAngle;
 
+  // The points relative to the IP: the centre lies k1 on from TS and R + p1 to the inside of the entry
+  // tangent; SC is the entry spiral's end seen from TS; CS lies R from the centre square to the direction
+  // in which the exit spiral starts.
   const C2dPos uIn = along(m_azIn), nIn = rightOf(m_azIn), uOut = along(m_azOut);
   const C2dPos ts = scaled(-m_tangentIn, uIn);
   const C2dPos centre = combine(in.k - m_tangentIn, uIn, side * (R + in.shift), nIn);
@@ -385,7 +388,9 @@ bool CCurveIp::getAzimuthAtLength(double length, CMathAngle& azimuth) const {
 double CCurveIp::getCurvatureAtLength(double length) const {
   double s = 0.0;
   const CGenericSegment* part = m_ok ? partAt(length, s) : nullptr;
-  return part != nullptr ? part->getCurvatureAtLength(s) : 0.0;
+  // The parts' curvature laws run on beyond their ends; off the group there is no curve.
+  return part != nullptr && svy_math::snapToRange(s, 0.0, part->getTotalLength()) ? part->getCurvatureAtLength(s)
+                                                                                  : 0.0;
 }
 
 bool CCurveIp::getLengthAndOffset(double north, double east, double& length, double& offset) const {

@@ -24,6 +24,9 @@
 // survey coordinates; the parts (CCurveSpiral TS-SC, CCurveArc, CCurveSpiral CS-ST) are then placed by
 // origin and azimuth and answer every query over their own length range.
 //
+// Threads: the parts fill caches inside const queries (angles, spiral laws), so one group must not be read
+// from two threads at once; distinct groups are independent.
+//
 // Degenerate tangents: a curve needs a real turn. Collinear tangents (|D| below tol::kZero) and a reversal
 // (|D| within tol::kHalfTurnDeg of a half turn, where the tangents would be infinite) define no curve and
 // fail; a simple point takes any deflection.

@@ -126,6 +126,7 @@ TEST_P(CurveIpGroup, ClosesOnTheExitTangent) {
   }
   EXPECT_NEAR(angleDiffDeg(azDegAt(g, total), azOut), 0.0, 1e-10);
   EXPECT_NEAR(angleDiffDeg(azDegAt(g, 0.0), azIn), 0.0, 1e-10);
+  EXPECT_TRUE(g.getCurvatureAtLength(-0.01) == 0.0 && g.getCurvatureAtLength(total + 0.01) == 0.0);
   const C2dPos ts = at(g.getIp(), azIn, -g.getTangentIn()), st = at(g.getIp(), azOut, g.getTangentOut());
   expectPosNear(g.getTS(), ts.north(), ts.east(), kSurveyClosure);
   expectPosNear(g.getST(), st.north(), st.east(), kSurveyClosure);
