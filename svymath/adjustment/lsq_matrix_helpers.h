@@ -44,7 +44,9 @@ SVYMATH_API bool ProdMat(const TLsqMatrix& left, const TLsqMatrix& right, TLsqMa
 SVYMATH_API ELeastSquaresStatus ComputeCovMatrix(const TLsqMatrix& a, const TLsqMatrix& w,
                                                  const TLsqMatrix& residuals, TLsqMatrix& covariance,
                                                  double& sigma0Squared);
-// The same for a linear problem and its solution X from leastSquares: the residuals are A X - Y.
+// The same for a linear problem and its solution X from leastSquares: the residuals are A X - Y. For a
+// converged non-linear problem use the form above with A at the solution and the residuals -Y (Y being
+// the misclosure, observed minus computed).
 SVYMATH_API ELeastSquaresStatus ComputeCovMatrix(const TLeastSquaresData& data, const svy_vector<double>& solution,
                                                  TLsqMatrix& covariance, double& sigma0Squared);
 
