@@ -113,7 +113,7 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
   }
   const SvyResult help = runSvy({"--help"});
   EXPECT_EQ(help.exitStatus, 0);
-  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time"}) {
+  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "view"}) {
     EXPECT_NE(help.out.find(family), std::string::npos) << family;
   }
 }
@@ -162,6 +162,20 @@ TEST(AngleConvert, TextFormsAndPackedMinutes) {
   EXPECT_EQ(mixed.exitStatus, 1);
   EXPECT_EQ(mixed.out, "value\n45.504233333\n7.500000000\n");
   EXPECT_EQ(mixed.err, "svy: line 2: value: '45.60' is not a dmm angle\n");
+}
+
+// svy view project: a 90 degree view on 800 x 600 pixels puts a target 45 degrees right on the right edge
+// and one 0.76 up at 1 ahead above the top; behind the observer there is no position; a bad view is a usage
+// error.
+TEST(ViewProject, KnownPixelsBehindAndBadViews) {
+  const std::vector<std::string> view = {"view", "project", "--observer", "5000000,500000,100", "--azimuth", "90",
+                                         "--fov", "90", "--screen", "800,600"};
+  const SvyResult r = runSvy(view, "n,e,h\n5000000,500100,100\n4999900,500100,100\n5000000,500100,176\n5000000,499900,100\n");
+  EXPECT_EQ(r.exitStatus, 0) << r.err;
+  EXPECT_EQ(r.out, "x,y,inside\n400.00,300.00,1\n800.00,300.00,1\n400.00,-4.00,0\nnan,nan,0\n");
+  std::vector<std::string> bad = view;
+  bad[7] = "180";
+  EXPECT_EQ(runSvy(bad, "").exitStatus, 2);
 }
 
 // svy units convert: published unit definitions, the deliberate asymmetries of the factors, and round trips.
