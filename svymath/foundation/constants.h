@@ -29,16 +29,28 @@ constexpr double kPolarAxisDistance = 1e-10;
 // earth near the equatorial plane (where the map's slope approaches 1) need up to a few million. Reaching
 // the cap ends with NaN instead of looping.
 constexpr int kGeodeticIterationCap = 100000000;
-// Geodesic inverse (azimuth between two geodetic positions): the longitude on the auxiliary sphere is
-// iterated until it changes by less than this (radians, 0.006 mm on the earth), at most kGeodesicIterationCap
-// times.
-constexpr double kGeodesicLongitude = 1e-12;
-constexpr int kGeodesicIterationCap = 200;
-// Nearly antipodal pairs: where the classic iteration fails, a damped one (each step moves this fraction of
-// the classic update, at most kGeodesicDampedCap steps) settles for all but ~0.3% of pairs within 1 deg of
-// the antipode; the rest take the auxiliary great-circle azimuth.
-constexpr double kGeodesicRelaxation = 0.05;
-constexpr int kGeodesicDampedCap = 10000;
+// Geodesic inverse: Newton's method on the azimuth at the first point stops once the longitude misclosure
+// is within this (radians: the spacing of doubles at 1, 0.006 micrometres on the earth); it is 8 times this
+// after a Newton step already judged converged, where rounding can hold the misclosure a few ulps away.
+constexpr double kGeodesicLongitude = 2.220446049250313e-16;
+// Newton steps before the solver falls back to bisection alone, and the cap of all steps. Newton converges
+// in 2 to 5 steps from the starting azimuth (antipodal pairs included); each bisection halves the bracket
+// of the azimuth, so 63 more reach the resolution of a double.
+constexpr int kGeodesicNewtonSteps = 20;
+constexpr int kGeodesicSolverSteps = 83;
+// A bisection bracket narrower than this (radians, epsilon^1.5) cannot shrink further.
+constexpr double kGeodesicBracket = 3.308722450212111e-24;
+// Guard against dividing by an exact zero: the cosine of a latitude at a pole, an equatorial azimuth
+// (sqrt of the smallest normal double).
+constexpr double kGeodesicTiny = 1.4916681462400413e-154;
+// Pairs closer than this on the auxiliary sphere (radians, about 0.2 m) are solved in closed form on a
+// sphere scaled at their mean latitude: its error there, of order f sigma^3, is below a double's resolution.
+constexpr double kGeodesicShortLine = 3.6e-08;
+// Starting azimuth near the antipode: pairs within kGeodesicAntipodalStrip (radians of reduced latitude,
+// 200 epsilon) of the equatorial cut, and no more than kGeodesicCutMargin (a fraction of the cut's
+// half-length) beyond its end, start from the meridian-like azimuth; the others from the astroid.
+constexpr double kGeodesicAntipodalStrip = 4.440892098500626e-14;
+constexpr double kGeodesicCutMargin = 1.4901161193847656e-05;
 
 }  // namespace tol
 
