@@ -1,11 +1,13 @@
 // svy geo: geodetic (latitude, longitude in degrees, ellipsoidal height in metres) and earth-centred
-// Cartesian coordinates (X, Y, Z in metres) on the library's reference ellipsoid, and local east/north/up
-// differences with azimuth, elevation and slope distance from an origin.
+// Cartesian coordinates (X, Y, Z in metres) on the library's reference ellipsoid, local east/north/up
+// differences with azimuth, elevation and slope distance from an origin, and the geodesic inverse and
+// direct problems (azimuths in degrees clockwise from north, written in [0, 360)).
 #include "row_io.h"
 #include "verbs.h"
 
 #include "svymath/foundation/constants.h"
 #include "svymath/geodesy/geo_coord.h"
+#include "svymath/geodesy/geodesic.h"
 #include "svymath/geodesy/local_frame.h"
 
 #include <CLI/CLI.hpp>
@@ -36,6 +38,12 @@ bool isLatitude(double latDeg) { return std::fabs(latDeg) <= kMaxLatitudeDeg; }
 double signedLongitudeDeg(double lonRad) {
   const double deg = lonRad * kRadToDeg;
   return deg > kHalfTurnDeg ? deg - kFullTurnDeg : deg;
+}
+
+// Azimuths are written in [0, 360) as surveyors read them.
+double azimuthDeg(double azimuthRad) {
+  const double deg = azimuthRad * kRadToDeg;
+  return deg < 0.0 ? deg + kFullTurnDeg : deg;
 }
 
 // Parses "LAT,LON,H" (degrees, degrees, metres).
@@ -130,12 +138,67 @@ void addEnu(CLI::App& family) {
   });
 }
 
+void addInverse(CLI::App& family) {
+  CLI::App* verb = family.add_subcommand(
+      "inverse", "Geodesic distance and forward azimuths at both ends: rows lat1_deg,lon1_deg,lat2_deg,lon2_deg");
+  const std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
+  verb->callback([verb, input] {
+    const svy_tool::RowFormat format{{"lat1_deg", "lon1_deg", "lat2_deg", "lon2_deg"},
+                                     true,
+                                     {{"distance", kLengthDecimals},
+                                      {"azimuth1_deg", kDirectionDecimals},
+                                      {"azimuth2_deg", kDirectionDecimals}}};
+    svy_tool::finishVerb(svy_tool::runRows(
+        *input, format, svy_tool::outputOptionsFor(*verb),
+        [](const svy_tool::InputRow& row, std::vector<svy_tool::Cell>& out, std::string& error) {
+          const std::vector<double>& v = row.numbers;
+          double distance = 0.0, az1 = 0.0, az2 = 0.0;
+          if (!isLatitude(v[0]) || !isLatitude(v[2]) ||
+              !svy_math::invers(v[0] * kDegToRad, v[1] * kDegToRad, v[2] * kDegToRad, v[3] * kDegToRad, distance,
+                                az1, az2)) {
+            error = "latitude must lie within -90 to 90 degrees";
+            return false;
+          }
+          out = {distance, azimuthDeg(az1), azimuthDeg(az2)};
+          return true;
+        }));
+  });
+}
+
+void addDirect(CLI::App& family) {
+  CLI::App* verb = family.add_subcommand(
+      "direct", "End point and forward azimuth of a geodesic: rows lat_deg,lon_deg,azimuth_deg,distance");
+  const std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
+  verb->callback([verb, input] {
+    const svy_tool::RowFormat format{{"lat_deg", "lon_deg", "azimuth_deg", "distance"},
+                                     true,
+                                     {{"lat_deg", kLatLonDecimals},
+                                      {"lon_deg", kLatLonDecimals},
+                                      {"azimuth2_deg", kDirectionDecimals}}};
+    svy_tool::finishVerb(svy_tool::runRows(
+        *input, format, svy_tool::outputOptionsFor(*verb),
+        [](const svy_tool::InputRow& row, std::vector<svy_tool::Cell>& out, std::string& error) {
+          const std::vector<double>& v = row.numbers;
+          double lat = 0.0, lon = 0.0, az2 = 0.0;
+          if (!isLatitude(v[0]) || !svy_math::frgeod(v[0] * kDegToRad, v[1] * kDegToRad, v[2] * kDegToRad, v[3], lat,
+                                                     lon, az2)) {
+            error = "latitude must lie within -90 to 90 degrees";
+            return false;
+          }
+          out = {lat * kRadToDeg, lon * kRadToDeg, azimuthDeg(az2)};
+          return true;
+        }));
+  });
+}
+
 }  // namespace
 
 void registerGeoVerbs(CLI::App& app) {
-  CLI::App* family = app.add_subcommand("geo", "Geodetic, earth-centred and local east/north/up coordinates");
+  CLI::App* family = app.add_subcommand("geo", "Geodetic, earth-centred and local east/north/up coordinates; geodesics");
   family->require_subcommand(1);
   addToEcef(*family);
   addToGeodetic(*family);
   addEnu(*family);
+  addInverse(*family);
+  addDirect(*family);
 }
