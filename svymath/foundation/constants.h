@@ -108,6 +108,15 @@ constexpr double kLinearCoeffZero = 1e-5;
 // up to sqrt(2 R 1e-8) from the touching point (1.4 mm for R = 100 m): the precision to which data
 // rounded at that level defines a touching point anyway.
 constexpr double kTangency = 1e-8;
+// Control points of a plane localization spread (root mean square about their centroid) over less than this
+// (metres) fix no rotation or scale: they count as coincident.
+constexpr double kControlSpread = 1e-3;
+// A localization control point is flagged when its externally studentized residual exceeds this: a 2-D
+// residual beyond three of its standard deviations, 1.1% likely for a good point (chi-square, 2 degrees).
+constexpr double kOutlierFactor = 3.0;
+// A residual shorter than this (metres) is rounding of exact control, never a blunder: doubles at
+// N 10 000 000 are 2e-9 m apart and a fit over a few of them loses a few hundred such steps.
+constexpr double kResidualZero = 1e-6;
 
 }  // namespace tol
 
