@@ -1,0 +1,71 @@
+// svy geo inverse/direct, localize and resect on the shipped examples: round trips between verbs, the
+// flagged blunder of the example control, and bad rows.
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <string>
+#include <vector>
+
+#include "svy_runner.h"
+
+namespace {
+
+using svy_test::csvRow;
+using svy_test::examplesPath;
+using svy_test::runJson;
+using svy_test::runSvy;
+using svy_test::SvyResult;
+
+// Each example pair's inverse fed to the direct problem lands on the second point (1e-9 degree is 0.1 mm),
+// and arrives with the forward azimuth the inverse gave.
+TEST(SvyGeodesic, InverseThenDirectReturnsToTheSecondPoint) {
+  const nlohmann::json pairs = runJson({"geo", "inverse", examplesPath("geodesic_pairs.csv")});
+  ASSERT_EQ(pairs.size(), 4u);
+  const double input[][4] = {
+      {47.3769, 8.5417, 47.3770, 8.5430}, {-33.8568, 151.2153, 51.5007, -0.1246}, {0.5, 10, -0.4, -170.4}, {60, 30, 70, -150}};
+  for (size_t i = 0; i < pairs.size(); ++i) {
+    const nlohmann::json& p = pairs[i];
+    const nlohmann::json end = runJson({"geo", "direct"}, csvRow({input[i][0], input[i][1], p["azimuth1_deg"].get<double>(),
+                                                                  p["distance"].get<double>()}))[0];
+    EXPECT_NEAR(end["lat_deg"].get<double>(), input[i][2], 1e-9) << i;
+    EXPECT_NEAR(std::remainder(end["lon_deg"].get<double>() - input[i][3], 360.0), 0.0, 1e-9) << i;
+    EXPECT_NEAR(std::remainder(end["azimuth2_deg"].get<double>() - p["azimuth2_deg"].get<double>(), 360.0), 0.0, 1e-7);
+  }
+  EXPECT_EQ(runJson({"geo", "direct", examplesPath("geodesic_shots.csv")}).size(), 3u);
+  const SvyResult bad = runSvy({"geo", "inverse"}, "0,0,1,1\n95,0,0,0\n");
+  EXPECT_EQ(bad.exitStatus, 1);
+  EXPECT_EQ(bad.lines().size(), 2u);
+  EXPECT_NE(bad.err.find("line 2: latitude must lie within"), std::string::npos) << bad.err;
+}
+
+// The example control: the fit's transformation applied to the site points and back; the blunder C4 is the
+// one point flagged; too few points fail with a message.
+TEST(SvyLocalize, FitApplyAndBackWithTheBlunderFlagged) {
+  const nlohmann::json fit = runJson({"localize", "fit", examplesPath("site_control.csv")})[0];
+  const nlohmann::json residuals = runJson({"localize", "fit", "--residuals", examplesPath("site_control.csv")});
+  ASSERT_EQ(residuals.size(), 6u);
+  for (const nlohmann::json& r : residuals)
+    EXPECT_EQ(r["flag"].get<std::string>(), r["id"].get<std::string>() == "C4" ? "outlier" : "") << r["id"];
+  const auto text = [&fit](const char* key) {
+    const std::string row = csvRow({fit[key].get<double>()});
+    return row.substr(0, row.size() - 1);
+  };
+  const std::vector<std::string> transform = {"--scale", text("scale"), "--rotation", text("rotation_deg"),
+                                              "--shift", text("shift_n") + "," + text("shift_e")};
+  std::vector<std::string> apply = {"--full-precision", "localize", "apply"};
+  apply.insert(apply.end(), transform.begin(), transform.end());
+  const SvyResult there = runSvy(apply, "n,e\n1000,2000\n1500.25,1700.75\n");
+  ASSERT_EQ(there.exitStatus, 0) << there.err;
+  apply.push_back("--inverse");
+  const SvyResult back = runSvy(apply, there.out);
+  EXPECT_EQ(back.lines().size(), 3u);
+  const std::vector<std::string> first = svy_test::split(back.lines()[2], ',');
+  EXPECT_NEAR(std::stod(first[0]), 1500.25, 1e-9);
+  EXPECT_NEAR(std::stod(first[1]), 1700.75, 1e-9);
+  const SvyResult few = runSvy({"localize", "fit"}, "A,0,0,10,10\nB,x,0,1,1\n");
+  EXPECT_EQ(few.exitStatus, 1);
+  EXPECT_NE(few.err.find("line 2: n_from: 'x' is not a number"), std::string::npos) << few.err;
+  EXPECT_NE(few.err.find("at least two control points"), std::string::npos) << few.err;
+}
+
+}  // namespace
