@@ -16,13 +16,11 @@ using detail::kGeodesicOrder;
 using detail::normalizePair;
 using detail::sinCosSeries;
 
-bool isLatitude(double lat) { return std::isfinite(lat) && std::fabs(lat) <= units::kHalfPi; }
-
 }  // namespace
 
 bool frgeod(double lat1, double lon1, double azimuth1, double distance, double& lat2, double& lon2,
             double& azimuth2) {
-  if (!isLatitude(lat1) || !std::isfinite(lon1) || !std::isfinite(azimuth1) || !std::isfinite(distance))
+  if (!detail::isLatitude(lat1) || !std::isfinite(lon1) || !std::isfinite(azimuth1) || !std::isfinite(distance))
     return false;
   const detail::GeodesicEllipsoid& ell = detail::geodesicEllipsoid();
   const double salp1 = std::sin(azimuth1), calp1 = std::cos(azimuth1);

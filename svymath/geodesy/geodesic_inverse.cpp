@@ -248,13 +248,11 @@ void solveAzimuth(const GeodesicEllipsoid& ell, const ReducedPoint& p1, const Re
   sol.calp2 = at.calp2;
 }
 
-bool isLatitude(double lat) { return std::isfinite(lat) && std::fabs(lat) <= units::kHalfPi; }
-
 }  // namespace
 
 bool invers(double lat1, double lon1, double lat2, double lon2, double& distance, double& azimuth1,
             double& azimuth2) {
-  if (!isLatitude(lat1) || !isLatitude(lat2) || !std::isfinite(lon1) || !std::isfinite(lon2)) return false;
+  if (!detail::isLatitude(lat1) || !detail::isLatitude(lat2) || !std::isfinite(lon1) || !std::isfinite(lon2)) return false;
   const GeodesicEllipsoid& ell = detail::geodesicEllipsoid();
   double lam12 = std::remainder(lon2 - lon1, units::kTwoPi);
   // -pi and pi are one meridian; take pi so that the canonical difference is non-negative.

@@ -4,6 +4,7 @@
 
 #include <cmath>
 
+#include "svymath/foundation/constants.h"
 #include "svymath/geodesy/ellipsoid.h"
 
 namespace svy_math {
@@ -118,6 +119,8 @@ double sinCosSeries(double sinSigma, double cosSigma, const double* c, int count
   }
   return 2.0 * sinSigma * cosSigma * b1;
 }
+
+bool isLatitude(double lat) { return std::isfinite(lat) && std::fabs(lat) <= units::kHalfPi; }
 
 void normalizePair(double& s, double& c) {
   const double r = std::hypot(s, c);

@@ -48,6 +48,9 @@ void geodesicC3(const GeodesicEllipsoid& ell, double eps, double c[kGeodesicOrde
 // sum_{l=1..count} c[l] sin(2 l sigma) from sin and cos of sigma, by Clenshaw summation.
 double sinCosSeries(double sinSigma, double cosSigma, const double* c, int count);
 
+// Whether a latitude (radians) is finite and within [-pi/2, pi/2].
+bool isLatitude(double lat);
+
 // Scales (s, c) to a unit vector.
 void normalizePair(double& s, double& c);
 
