@@ -54,6 +54,7 @@
 #include "svymath/adjustment/least_squares.h"
 #include "svymath/adjustment/best_fit.h"
 #include "svymath/adjustment/fit_quality.h"
+#include "svymath/adjustment/three_d_resection.h"
 #include "svymath/geodesy/ellipsoid.h"
 #include "svymath/geodesy/geo_coord.h"
 #include "svymath/geodesy/local_frame.h"

@@ -122,6 +122,15 @@ constexpr double kResidualZero = 1e-6;
 
 namespace units {
 
+// Refraction coefficient of the line of sight over land by day (the ratio of the earth's radius to that
+// of the light path), the usual default of trigonometric heighting.
+constexpr double kRefractionCoefficient = 0.13;
+// Default a-priori accuracies of a total station: 3 seconds of arc for directions and zenith angles
+// (radians), 2 mm + 2 ppm for distances.
+constexpr double kDefaultAngleSd = 1.454441043328608e-05;
+constexpr double kDefaultDistanceSd = 0.002;
+constexpr double kDefaultDistancePpm = 2.0;
+constexpr double kPartsPerMillion = 1e-6;
 // Radius of the spherical earth used for small steps in latitude and longitude (metres).
 constexpr double kSphereEarthRadius = 6.371e6;
 // Degrees of latitude per metre on that sphere: 180 / (pi * 6.371e6).
@@ -243,7 +252,21 @@ constexpr int kJacobiSweepCap = 100;
 // a hundred times that, only ends a problem whose convergence criteria can never be met.
 constexpr int kGaussNewtonIterationCap = 1000;
 
+// Orientations tried for the starting position (a half-degree grid): Gauss-Newton converges from within a
+// few degrees of any sound geometry.
+constexpr int kResectionOrientationSteps = 720;
+
 }  // namespace limits
+
+namespace tol {
+
+// Free-station resection: Gauss-Newton stops once the station moves by less than kResectionPosition
+// (metres) and the orientation turns by less than kResectionOrientation (radians, 1e-12 rad is 0.001 mm at
+// 1000 km), far below survey precision and well above the rounding of local coordinates.
+constexpr double kResectionPosition = 1e-9;
+constexpr double kResectionOrientation = 1e-12;
+
+}  // namespace tol
 
 // Circular-curve formulas (radius, deflection, degree of curve, tangent, external, middle ordinate).
 namespace tol {
