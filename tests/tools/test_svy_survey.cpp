@@ -68,4 +68,28 @@ TEST(SvyLocalize, FitApplyAndBackWithTheBlunderFlagged) {
   EXPECT_NE(few.err.find("at least two control points"), std::string::npos) << few.err;
 }
 
+// The example setup was generated from the station N 5213400, E 498700, H 412.35, orientation 37 degrees,
+// with millimetre-level noise: the result lies within three of its stated standard deviations. A bad row
+// is reported and the others still solve; without the instrument height the command is refused.
+TEST(SvyResect, ExampleSetupGivesItsStationBack) {
+  const nlohmann::json r = runJson({"resect", "--instrument-height", "1.55", examplesPath("resection.csv")})[0];
+  const double truth[][2] = {{5213400.0, r["sd_n"].get<double>()}, {498700.0, r["sd_e"].get<double>()},
+                             {412.35, r["sd_h"].get<double>()}};
+  const char* keys[] = {"n", "e", "h"};
+  for (int k = 0; k < 3; ++k) {
+    EXPECT_GT(truth[k][1], 0.0);
+    EXPECT_LT(std::fabs(r[keys[k]].get<double>() - truth[k][0]), 3.0 * truth[k][1]) << keys[k];
+  }
+  EXPECT_NEAR(r["orientation_deg"].get<double>(), 37.0, 1e-3);
+  const std::string rows = svy_test::readWhole(examplesPath("resection.csv"));
+  const SvyResult bad = runSvy({"resect", "--instrument-height", "1.55"}, rows + "P5,1,2,3,x,,,\n");
+  EXPECT_EQ(bad.exitStatus, 1);
+  EXPECT_EQ(bad.lines().size(), 2u);
+  EXPECT_NE(bad.err.find("line 8: hz_deg: 'x' is not a number"), std::string::npos) << bad.err;
+  EXPECT_EQ(runSvy({"resect"}, rows).exitStatus, 2);
+  const SvyResult few = runSvy({"resect", "--instrument-height", "1.5"}, "A,100,100,10,45,,,\n");
+  EXPECT_EQ(few.exitStatus, 1);
+  EXPECT_NE(few.err.find("too few observations"), std::string::npos) << few.err;
+}
+
 }  // namespace

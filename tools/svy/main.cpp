@@ -24,6 +24,7 @@ int main(int argc, char** argv) {
   registerGeoVerbs(app);
   registerTimeVerbs(app);
   registerLocalizeVerbs(app);
+  registerResectVerbs(app);
 
   try {
     app.parse(argc, argv);

@@ -19,3 +19,5 @@ void registerGeoVerbs(CLI::App& app);
 void registerTimeVerbs(CLI::App& app);
 // "svy localize": plane localization (site calibration) fit and apply.
 void registerLocalizeVerbs(CLI::App& app);
+// "svy resect": free-station resection.
+void registerResectVerbs(CLI::App& app);
