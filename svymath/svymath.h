@@ -63,6 +63,7 @@
 #include "svymath/geodesy/local_datum.h"
 #include "svymath/geodesy/grid_ground.h"
 #include "svymath/geodesy/helmert.h"
+#include "svymath/geodesy/geodetic_offsets.h"
 #include "svymath/geodesy/gps_time.h"
 #include "svymath/formats/number_predicates.h"
 #include "svymath/formats/sign_strings.h"

@@ -74,6 +74,12 @@ class SVYMATH_API Coord : public svy_math::TAbstractPoint3<double> {
 
   // Geodetic (latitude, longitude, ellipsoidal height) to Cartesian; defined with the geodesy functions.
   Coord& blh2xyz(const GeoCoord& geodetic);
+  // Moves this position by a local (east, north, up) vector (metres) in the local-level frame at this
+  // position (defined with the geodesy functions). False, unchanged, when a value is not finite.
+  bool offsetCoord(const svy_math::TAbstractPoint3<double>& enu);
+  // The (east, north, up) vector (metres) from this position to `other` in the local-level frame here.
+  // False (enu unchanged) when a value is not finite.
+  bool relatCoord(const Coord& other, svy_math::TAbstractPoint3<double>& enu) const;
 };
 
 static_assert(sizeof(Coord) == 3 * sizeof(double), "a Cartesian coordinate is three doubles");

@@ -12,17 +12,15 @@ using Vec3 = TAbstractPoint3<double>;
 
 bool isFinite(const Vec3& v) { return std::isfinite(v[0]) && std::isfinite(v[1]) && std::isfinite(v[2]); }
 
-// The earth-centred difference of a local-level (east, north, up) vector at (B, L): the transpose of the
-// rotation of blh_to_neu.
-Vec3 enuToCartesianDelta(double lat, double lon, const Vec3& enu) {
-  const double sinB = std::sin(lat), cosB = std::cos(lat), sinL = std::sin(lon), cosL = std::cos(lon);
+}  // namespace
+
+Vec3 neu_to_xyz(const Vec3& blh, const Vec3& enu) {
+  const double sinB = std::sin(blh[0]), cosB = std::cos(blh[0]), sinL = std::sin(blh[1]), cosL = std::cos(blh[1]);
   const double e = enu[0], n = enu[1], u = enu[2];
   // Component along the meridian plane, outward from the polar axis.
   const double outward = -sinB * n + cosB * u;
   return Vec3(cosL * outward - sinL * e, sinL * outward + cosL * e, cosB * n + sinB * u);
 }
-
-}  // namespace
 
 bool TLocDatum::blh2loc(const GeoCoord& blh, Vec3& ptl) const {
   if (!initialized || !isFinite(blh)) return false;
@@ -32,7 +30,7 @@ bool TLocDatum::blh2loc(const GeoCoord& blh, Vec3& ptl) const {
 
 bool TLocDatum::loc2blh(const Vec3& ptl, GeoCoord& blh) const {
   if (!initialized || !isFinite(ptl)) return false;
-  const Coord xyz = originXyz + enuToCartesianDelta(origin.lat(), origin.lon(), ptl);
+  const Coord xyz = originXyz + neu_to_xyz(origin, ptl);
   GeoCoord g;
   g.xyz2blh(xyz);
   if (!isFinite(g)) return false;
@@ -93,7 +91,7 @@ bool PtlTodENU(const TLocDatum& datum, const Vec3& from, const Vec3& to, Vec3& d
   if (!datum.loc2blh(from, atFrom) || !isFinite(to)) return false;
   // Both points share the origin's frame: their difference, back to earth-centred axes, then into the frame
   // at `from`.
-  denu = blh_to_neu(atFrom, enuToCartesianDelta(datum.origin.lat(), datum.origin.lon(), to - from));
+  denu = blh_to_neu(atFrom, neu_to_xyz(datum.origin, to - from));
   return true;
 }
 

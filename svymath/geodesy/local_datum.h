@@ -22,6 +22,10 @@
 
 namespace svy_math {
 
+// The earth-centred difference (metres) of a local-level (east, north, up) vector at latitude blh[0] and
+// longitude blh[1] (radians): the inverse rotation of blh_to_neu.
+SVYMATH_API TAbstractPoint3<double> neu_to_xyz(const TAbstractPoint3<double>& blh, const TAbstractPoint3<double>& enu);
+
 struct SVYMATH_API TLocDatum {
   GeoCoord origin;            // latitude, longitude (radians), ellipsoidal height (metres)
   double north0 = 0.0;        // site coordinates of the origin (metres)
@@ -61,6 +65,7 @@ SVYMATH_API bool PtlTodENU(const TLocDatum& datum, const TAbstractPoint3<double>
 }  // namespace svy_math
 
 using svy_math::ENCoordsToPtl;
+using svy_math::neu_to_xyz;
 using svy_math::InitializeLPS2;
 using svy_math::PtlTodENU;
 using svy_math::PtlToENCoords;

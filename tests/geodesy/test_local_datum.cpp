@@ -9,6 +9,7 @@
 #include "svymath/foundation/constants.h"
 #include "svymath/geodesy/ellipsoid.h"
 #include "svymath/geodesy/geodesic.h"
+#include "svymath/geodesy/geodetic_offsets.h"
 #include "svymath/geodesy/geomath_consts.h"
 #include "svymath/geodesy/grid_ground.h"
 #include "svymath/geodesy/local_datum.h"
@@ -127,6 +128,38 @@ TEST(GridGround, CombinedFactorAndRoundTrips) {
   EXPECT_FALSE(GridToGround(base, std::nan(""), base, out));
   EXPECT_TRUE(std::isnan(CombinedScaleFactor(2.0, 0.0, 1.0)));
   EXPECT_TRUE(std::isnan(CombinedScaleFactor(0.0, -7.0e6, 1.0)));
+}
+
+// Offsets: a geodetic position moved by north/east/up and measured back; an earth-centred one moved by a
+// local vector, related back, and read against the independent local frame.
+TEST(GeodeticOffsets, RoundTripsAndIndependentFrame) {
+  const double cases[][6] = {{47.4, 8.5, 450.0, 12.5, -7.25, 3.0}, {-89.5, 120.0, 0.0, 1500.0, 2500.0, -40.0},
+                             {0.0, -179.9999, 10.0, -0.001, 0.002, 0.0}};
+  for (const auto& c : cases) {
+    const GeoCoord start(c[0] * kDegToRad, c[1] * kDegToRad, c[2]);
+    GeoCoord moved;
+    double dn = 0, de = 0, du = 0;
+    ASSERT_TRUE(OffsetWgsCoords(start, c[3], c[4], c[5], moved));
+    ASSERT_TRUE(GetOffsetFromWgsCoords(start, moved, dn, de, du));
+    EXPECT_NEAR(dn, c[3], 1e-8);
+    EXPECT_NEAR(de, c[4], 1e-8);
+    EXPECT_NEAR(du, c[5], 1e-9);
+    const Coord origin = Coord().blh2xyz(start);
+    Coord p = origin;
+    Vec3 enu;
+    ASSERT_TRUE(p.offsetCoord(Vec3(c[4], c[3], c[5])));
+    ASSERT_TRUE(origin.relatCoord(p, enu));
+    EXPECT_LT((enu - Vec3(c[4], c[3], c[5])).Module(), 1e-8);
+    const GeographicLib::LocalCartesian frame(c[0], c[1], c[2], independentEarth());
+    double lat = 0, lon = 0, h = 0, x = 0, y = 0, z = 0;
+    independentEarth().Reverse(p.x(), p.y(), p.z(), lat, lon, h);
+    frame.Forward(lat, lon, h, x, y, z);
+    EXPECT_LT((Vec3(x, y, z) - enu).Module(), 1e-6);
+  }
+  GeoCoord out;
+  EXPECT_FALSE(OffsetWgsCoords(GeoCoord(0, 0, std::nan("")), 1, 1, 1, out));
+  Coord bad(std::nan(""), 0, 0);
+  EXPECT_FALSE(bad.offsetCoord(Vec3(1, 1, 1)));
 }
 
 }  // namespace
