@@ -38,6 +38,36 @@ TEST(SvyGeodesic, InverseThenDirectReturnsToTheSecondPoint) {
   EXPECT_NE(bad.err.find("line 2: latitude must lie within"), std::string::npos) << bad.err;
 }
 
+// Grid/ground: distances from the base scale by the combined factor (here from the site: 0.9996 times the
+// height factor of 450 m, about 70.6 ppm), and grid-to-ground returns the ground points. Helmert: the
+// published WGS 72 to WGS 84 example, and back with --inverse.
+TEST(SvyGeoSite, GridGroundAndHelmert) {
+  const std::vector<std::string> site = {"--base", "5213400,498700", "--site", "47.1,450,0.9996"};
+  std::vector<std::string> args = {"--full-precision", "geo", "ground-to-grid"};
+  args.insert(args.end(), site.begin(), site.end());
+  args.push_back(examplesPath("ground_points.csv"));
+  const SvyResult grid = runSvy(args);
+  ASSERT_EQ(grid.exitStatus, 0) << grid.err;
+  const std::vector<std::string> p = svy_test::split(grid.lines()[2], ',');
+  const double factor = std::hypot(std::stod(p[0]) - 5213400, std::stod(p[1]) - 498700) / std::hypot(250.2, 50.9);
+  EXPECT_NEAR(factor, 0.9996 * (1 - 450.0 / 6.3787e6), 2e-7);
+  args = {"--full-precision", "geo", "grid-to-ground"};
+  args.insert(args.end(), site.begin(), site.end());
+  const std::vector<std::string> back = svy_test::split(runSvy(args, grid.out).lines()[3], ',');
+  EXPECT_NEAR(std::stod(back[0]), 5213480.7, 1e-8);
+  EXPECT_NEAR(std::stod(back[1]), 499110.3, 1e-8);
+  EXPECT_EQ(runSvy({"geo", "ground-to-grid", "--base", "0,0"}, "1,1\n").exitStatus, 2);
+  const nlohmann::json wgs84 =
+      runJson({"geo", "helmert", "--params", "0,0,4.5,0,0,0.554,0.219", examplesPath("frame_points.csv")})[0];
+  EXPECT_NEAR(wgs84["x"].get<double>(), 3657660.78, 0.006);
+  EXPECT_NEAR(wgs84["y"].get<double>(), 255778.43, 0.006);
+  EXPECT_NEAR(wgs84["z"].get<double>(), 5201387.75, 0.006);
+  const nlohmann::json wgs72 = runJson({"geo", "helmert", "--params", "0,0,4.5,0,0,0.554,0.219", "--inverse"},
+                                       csvRow({wgs84["x"].get<double>(), wgs84["y"].get<double>(), wgs84["z"].get<double>()}))[0];
+  EXPECT_NEAR(wgs72["x"].get<double>(), 3657660.66, 1e-8);
+  EXPECT_NEAR(wgs72["z"].get<double>(), 5201382.11, 1e-8);
+}
+
 // The example control: the fit's transformation applied to the site points and back; the blunder C4 is the
 // one point flagged; too few points fail with a message.
 TEST(SvyLocalize, FitApplyAndBackWithTheBlunderFlagged) {
