@@ -30,7 +30,7 @@ constexpr double kPolarAxisDistance = 1e-10;
 // the cap ends with NaN instead of looping.
 constexpr int kGeodeticIterationCap = 100000000;
 // Geodesic inverse: Newton's method on the azimuth at the first point stops once the longitude misclosure
-// is within this (radians: the spacing of doubles at 1, 0.006 micrometres on the earth); it is 8 times this
+// is within this (radians: the spacing of doubles at 1, 1.4e-9 m on the earth); it is 8 times this
 // after a Newton step already judged converged, where rounding can hold the misclosure a few ulps away.
 constexpr double kGeodesicLongitude = 2.220446049250313e-16;
 // Newton steps before the solver falls back to bisection alone, and the cap of all steps. Newton converges

@@ -5,8 +5,11 @@
 #include <GeographicLib/Geodesic.hpp>
 #include <algorithm>
 #include <cmath>
+#include <functional>
 #include <limits>
 #include <random>
+#include <thread>
+#include <vector>
 
 #include "svymath/foundation/constants.h"
 #include "svymath/geodesy/ellipsoid.h"
@@ -139,6 +142,27 @@ TEST(GeodesicInverse, BadInputAndCoincidentPoints) {
   EXPECT_EQ(s, -1.0);
   ASSERT_TRUE(svy_math::invers(0.7, 0.1, 0.7, 0.1 + kTwoPi, s, a1, a2));
   EXPECT_EQ(s, 0.0);
+}
+
+// Nothing is shared but the ellipsoid, built once on first use: threads solving at once (the first call
+// among them) get the answers of one thread alone.
+TEST(GeodesicConcurrency, ThreadsGetTheSameAnswers) {
+  const std::vector<Pair> all = testPairs();
+  const std::vector<Pair> pairs(all.begin(), all.begin() + 600);
+  auto solveAll = [&pairs](std::vector<double>& out) {
+    for (const Pair& p : pairs) {
+      double s = 0, a1 = 0, a2 = 0;
+      svy_math::invers(p.lat1 * kDegToRad, p.lon1 * kDegToRad, p.lat2 * kDegToRad, p.lon2 * kDegToRad, s, a1, a2);
+      out.push_back(s + a1 + a2);
+    }
+  };
+  std::vector<std::vector<double>> results(4);
+  std::vector<std::thread> threads;
+  for (auto& r : results) threads.emplace_back(solveAll, std::ref(r));
+  for (auto& t : threads) t.join();
+  std::vector<double> alone;
+  solveAll(alone);
+  for (const auto& r : results) EXPECT_EQ(r, alone);
 }
 
 }  // namespace
