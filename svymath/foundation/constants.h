@@ -97,6 +97,10 @@ constexpr double kLinearCoeffZero = 1e-5;
 // rounded at that level defines a touching point anyway.
 constexpr double kTangency = 1e-8;
 
+// Two bearings whose unit directions have a cross product (the sine of the angle between them) strictly
+// within +-1e-12 are parallel: their crossing would lie more than 1e12 times the points' separation away.
+constexpr double kParallelSine = 1e-12;
+
 }  // namespace tol
 
 namespace units {
