@@ -18,8 +18,6 @@ constexpr int kLogTraverseWithoutLength = 61;
 constexpr int kLogBadMeasuredLine = 112;
 constexpr int kLogMeasuredLineWithoutLength = 125;
 
-bool isFinite(const C2dPos& p) { return std::isfinite(p.north()) && std::isfinite(p.east()); }
-
 bool refuse(int line) {
   svy_logging::svy_err_log(kProportioningLogSource, line, "");
   return false;
@@ -35,7 +33,7 @@ double share(double runningSum, double total, double fallback) {
 
 bool TProportioning::adjustTraverse(const C2dPos& start, const C2dPos& end, const svy_vector<TTraverseLeg>& legs,
                                     ETraverseRule rule, TTraverseAdjustment& result) {
-  if (legs.empty() || !isFinite(start) || !isFinite(end)) return refuse(kLogBadTraverse);
+  if (legs.empty() || !start.isFinite() || !end.isFinite()) return refuse(kLogBadTraverse);
   double totalLength = 0.0, totalAbsN = 0.0, totalAbsE = 0.0, sumN = 0.0, sumE = 0.0;
   for (const TTraverseLeg& leg : legs) {
     if (!std::isfinite(leg.azimuth) || !std::isfinite(leg.distance) || leg.distance < 0.0)
@@ -83,10 +81,10 @@ bool TProportioning::adjustTraverse(const C2dPos& start, const C2dPos& end, cons
 
 bool TProportioning::proportionLine(const C2dPos& knownStart, const C2dPos& knownEnd,
                                     const svy_vector<C2dPos>& measured, svy_vector<C2dPos>& adjusted) {
-  if (measured.size() < 2 || !isFinite(knownStart) || !isFinite(knownEnd)) return refuse(kLogBadMeasuredLine);
+  if (measured.size() < 2 || !knownStart.isFinite() || !knownEnd.isFinite()) return refuse(kLogBadMeasuredLine);
   double total = 0.0;
   for (std::size_t i = 0; i < measured.size(); ++i) {
-    if (!isFinite(measured[i])) return refuse(kLogBadMeasuredLine);
+    if (!measured[i].isFinite()) return refuse(kLogBadMeasuredLine);
     if (i > 0)
       total += std::hypot(measured[i].north() - measured[i - 1].north(), measured[i].east() - measured[i - 1].east());
   }

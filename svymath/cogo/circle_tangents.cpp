@@ -5,6 +5,7 @@
 
 #include "svymath/cogo/circle_solvers.h"
 #include "svymath/cogo/cogo_intersections.h"
+#include "svymath/cogo/line_frame.h"
 #include "svymath/foundation/angle_functions.h"
 #include "svymath/foundation/constants.h"
 
@@ -12,21 +13,6 @@ namespace {
 
 using svy_math::tol::kTangency;
 using svy_math::tol::kZero;
-
-bool isFinite(const C2dPos& p) { return std::isfinite(p.north()) && std::isfinite(p.east()); }
-
-// The frame of a centre line: its start, unit direction u and right-hand normal n = (-uE, uN).
-struct TCentreLine {
-  C2dPos origin;
-  double uN = 0.0;
-  double uE = 0.0;
-  double length = 0.0;
-
-  // The point origin + a u + b n.
-  C2dPos at(double a, double b) const {
-    return C2dPos(origin.north() + a * uN - b * uE, origin.east() + a * uE + b * uN);
-  }
-};
 
 // The sine of the angle phi between the centre line and the radius to a touching point, where
 // cos phi = k / d: sqrt((d - k)(d + k)) / d, which keeps its digits when |k| is close to d.
@@ -41,17 +27,12 @@ CogoFunctions::ECogoMathErrorCode TTangentToCircles::solve(const C2dPos& center1
   using namespace CogoFunctions;
   m_count = 0;
   const bool point1 = radius1 < kZero, point2 = radius2 < kZero;
-  if (!isFinite(center1) || !isFinite(center2) || !(radius1 >= 0.0) || !(radius2 >= 0.0) ||
+  if (!center1.isFinite() || !center2.isFinite() || !(radius1 >= 0.0) || !(radius2 >= 0.0) ||
       !std::isfinite(radius1) || !std::isfinite(radius2) || (point1 && point2))
     return eCogoInvalidInput;
-  TCentreLine line;
-  line.origin = center1;
-  const double dN = center2.north() - center1.north(), dE = center2.east() - center1.east();
-  line.length = std::hypot(dN, dE);
-  if (!(line.length >= kZero)) return eCogoConcentric;
-  if (!std::isfinite(line.length)) return eCogoInvalidInput;
-  line.uN = dN / line.length;
-  line.uE = dE / line.length;
+  svy_math::detail::TLineFrame line;
+  if (!line.set(center1, center2))
+    return std::isfinite(center2.north() - center1.north()) ? eCogoConcentric : eCogoInvalidInput;
   const double d = line.length;
 
   // Outer tangents: the radius to each touching point has the same direction w, with w . u = (r1 - r2) / d.
@@ -89,7 +70,7 @@ CogoFunctions::ECogoMathErrorCode TTangentToCircles::solve(const C2dPos& center1
     }
   }
   for (int i = 0; i < m_count; ++i) {
-    if (!isFinite(m_tangents[i].onFirst) || !isFinite(m_tangents[i].onSecond)) {
+    if (!m_tangents[i].onFirst.isFinite() || !m_tangents[i].onSecond.isFinite()) {
       m_count = 0;
       return eCogoInvalidInput;
     }
@@ -115,10 +96,10 @@ int TwoCirclesIntersectionLine(const C2dPos& center1, double radius1, const C2dP
   if (found == 0) return 0;
   if (found == 1) {
     // The common tangent at the touching point is perpendicular to the centre line: step to its right.
-    const double dN = center2.north() - center1.north(), dE = center2.east() - center1.east();
-    const double d = std::hypot(dN, dE);
-    const double step = std::min(radius1, radius2) / d;
-    second = C2dPos(first.north() - step * dE, first.east() + step * dN);
+    svy_math::detail::TLineFrame centres;
+    centres.set(center1, center2);
+    centres.origin = first;
+    second = centres.at(0.0, std::min(radius1, radius2));
   }
   linePos1 = first;
   linePos2 = second;
@@ -138,7 +119,7 @@ ECogoMathErrorCode eFilletTwoLines(const C2dPos& point1, const CMathAngle& azimu
   const double tangentLength = radius * std::tan(std::fabs(turn) / 2.0);
   if (!std::isfinite(tangentLength)) return eCogoParallel;
   const bool clockwise = turn > 0.0;
-  TCentreLine first;
+  svy_math::detail::TLineFrame first;
   first.origin = crossing;
   first.uN = azimuth1.getCos();
   first.uE = azimuth1.getSin();
@@ -147,7 +128,7 @@ ECogoMathErrorCode eFilletTwoLines(const C2dPos& point1, const CMathAngle& azimu
   CMathAngle sweep;
   sweep.setRad(std::fabs(turn));
   CArc arc;
-  if (!isFinite(start) || !isFinite(centre) || !arc.set_start_center_cAngle(start, centre, sweep, clockwise))
+  if (!start.isFinite() || !centre.isFinite() || !arc.set_start_center_cAngle(start, centre, sweep, clockwise))
     return eCogoNoSolution;
   fillet = arc;
   return eCogoOk;

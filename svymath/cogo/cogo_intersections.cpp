@@ -12,14 +12,23 @@ namespace {
 
 using svy_math::tol::kZero;
 
-bool isFinite(const C2dPos& p) { return std::isfinite(p.north()) && std::isfinite(p.east()); }
 bool isPositiveDistance(double d) { return std::isfinite(d) && d >= kZero; }
+
+// Hands on the solutions of a circle solver that found `found` of them (0: none, outputs untouched).
+ECogoMathErrorCode acceptSolutions(int found, const C2dPos& first, const C2dPos& second, C2dPos& solution1,
+                                   C2dPos& solution2, int& count) {
+  if (found == 0) return eCogoNoSolution;
+  solution1 = first;
+  solution2 = second;
+  count = found;
+  return eCogoOk;
+}
 
 }  // namespace
 
 ECogoMathErrorCode eIntersectBearings(const C2dPos& point1, const CMathAngle& azimuth1, const C2dPos& point2,
                                       const CMathAngle& azimuth2, C2dPos& crossing) {
-  if (!isFinite(point1) || !isFinite(point2) || !azimuth1.isok() || !azimuth2.isok()) return eCogoInvalidInput;
+  if (!point1.isFinite() || !point2.isFinite() || !azimuth1.isok() || !azimuth2.isok()) return eCogoInvalidInput;
   // point1 + t1 u1 = point2 + t2 u2; the cross product with u2 leaves t1 = (rel x u2) / (u1 x u2), where
   // a x b = aN bE - aE bN is the sine of the angle from a to b for unit vectors.
   const double u1N = azimuth1.getCos(), u1E = azimuth1.getSin();
@@ -30,14 +39,14 @@ ECogoMathErrorCode eIntersectBearings(const C2dPos& point1, const CMathAngle& az
   const double relE = point2.east() - point1.east();
   const double t1 = (relN * u2E - relE * u2N) / sine;
   const C2dPos result(point1.north() + t1 * u1N, point1.east() + t1 * u1E);
-  if (!isFinite(result)) return eCogoNoSolution;
+  if (!result.isFinite()) return eCogoNoSolution;
   crossing = result;
   return eCogoOk;
 }
 
 ECogoMathErrorCode eIntersectBearingDistance(const C2dPos& point1, const CMathAngle& azimuth1, const C2dPos& point2,
                                              double distance2, C2dPos& solution1, C2dPos& solution2, int& count) {
-  if (!isFinite(point1) || !isFinite(point2) || !azimuth1.isok() || !isPositiveDistance(distance2))
+  if (!point1.isFinite() || !point2.isFinite() || !azimuth1.isok() || !isPositiveDistance(distance2))
     return eCogoInvalidInput;
   // A second point of the line at the scale of the problem, so that its rounding tilts the line by no more
   // than the rounding of the given points does.
@@ -47,27 +56,19 @@ ECogoMathErrorCode eIntersectBearingDistance(const C2dPos& point1, const CMathAn
   C2dPos ahead;
   azimuth1.getPosAlong(scale, point1, ahead);
   C2dPos first, second;
-  const int found = IntersectionCoordsOfLineAndCircle(point1, ahead, point2, distance2, first, second);
-  if (found == 0) return eCogoNoSolution;
-  solution1 = first;
-  solution2 = second;
-  count = found;
-  return eCogoOk;
+  return acceptSolutions(IntersectionCoordsOfLineAndCircle(point1, ahead, point2, distance2, first, second), first,
+                         second, solution1, solution2, count);
 }
 
 ECogoMathErrorCode eIntersectDistances(const C2dPos& point1, double distance1, const C2dPos& point2,
                                        double distance2, C2dPos& solution1, C2dPos& solution2, int& count) {
-  if (!isFinite(point1) || !isFinite(point2) || !isPositiveDistance(distance1) || !isPositiveDistance(distance2))
+  if (!point1.isFinite() || !point2.isFinite() || !isPositiveDistance(distance1) || !isPositiveDistance(distance2))
     return eCogoInvalidInput;
   const double apart = std::hypot(point2.north() - point1.north(), point2.east() - point1.east());
   if (!(apart >= kZero)) return eCogoConcentric;
   C2dPos first, second;
-  const int found = IntersectionCoordsOfTwoCircles(point1, distance1, point2, distance2, first, second);
-  if (found == 0) return eCogoNoSolution;
-  solution1 = first;
-  solution2 = second;
-  count = found;
-  return eCogoOk;
+  return acceptSolutions(IntersectionCoordsOfTwoCircles(point1, distance1, point2, distance2, first, second), first,
+                         second, solution1, solution2, count);
 }
 
 }  // namespace CogoFunctions

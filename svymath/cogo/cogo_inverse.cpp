@@ -3,6 +3,7 @@
 #include <cmath>
 #include <cstddef>
 
+#include "svymath/cogo/line_frame.h"
 #include "svymath/foundation/angle_functions.h"
 #include "svymath/foundation/constants.h"
 
@@ -12,57 +13,31 @@ namespace {
 
 using svy_math::tol::kZero;
 
-bool isFinite(const C2dPos& p) { return std::isfinite(p.north()) && std::isfinite(p.east()); }
-
-// A segment as its start, unit direction and length; false when it has no direction.
-struct TUnitSegment {
-  C2dPos start;
-  double uN = 0.0;
-  double uE = 0.0;
-  double length = 0.0;
-
-  bool set(const C2dPos& from, const C2dPos& to) {
-    const double dN = to.north() - from.north();
-    const double dE = to.east() - from.east();
-    length = std::hypot(dN, dE);
-    if (!(length >= kZero) || !std::isfinite(length)) return false;
-    start = from;
-    uN = dN / length;
-    uE = dE / length;
-    return true;
-  }
-  C2dPos at(double along, double offset) const {
-    // The right-hand normal of the direction (uN, uE) is (-uE, uN).
-    return C2dPos(start.north() + along * uN - offset * uE, start.east() + along * uE + offset * uN);
-  }
-  // Fills the inverse of p (along, offset, foot, nearest, distance, position).
-  void inverse(const C2dPos& p, TElementInverse& out) const {
-    const double relN = p.north() - start.north();
-    const double relE = p.east() - start.east();
-    out.along = uN * relN + uE * relE;
-    out.offset = uN * relE - uE * relN;
-    out.foot = at(out.along, 0.0);
-    out.position = out.along < 0.0 ? eFootBeforeStart : (out.along > length ? eFootAfterEnd : eFootOnElement);
-    const double clamped = out.position == eFootBeforeStart ? 0.0 : (out.position == eFootAfterEnd ? length : out.along);
-    out.nearest = out.position == eFootOnElement ? out.foot : at(clamped, 0.0);
-    out.distance = std::hypot(p.north() - out.nearest.north(), p.east() - out.nearest.east());
-    out.segment = 0;
-  }
-};
+// The inverse of p to the segment from the frame's origin over its length.
+void inverseToFrame(const svy_math::detail::TLineFrame& segment, const C2dPos& p, TElementInverse& out) {
+  out.along = segment.alongOf(p);
+  out.offset = segment.offsetOf(p);
+  out.foot = segment.at(out.along, 0.0);
+  out.position = out.along < 0.0 ? eFootBeforeStart : (out.along > segment.length ? eFootAfterEnd : eFootOnElement);
+  const double clamped = out.position == eFootBeforeStart ? 0.0 : segment.length;
+  out.nearest = out.position == eFootOnElement ? out.foot : segment.at(clamped, 0.0);
+  out.distance = std::hypot(p.north() - out.nearest.north(), p.east() - out.nearest.east());
+  out.segment = 0;
+}
 
 }  // namespace
 
 ECogoMathErrorCode eInverseToSegment(const C2dPos& start, const C2dPos& end, const C2dPos& point,
                                      TElementInverse& result) {
-  if (!isFinite(start) || !isFinite(end) || !isFinite(point)) return eCogoInvalidInput;
-  TUnitSegment segment;
+  if (!start.isFinite() || !end.isFinite() || !point.isFinite()) return eCogoInvalidInput;
+  svy_math::detail::TLineFrame segment;
   if (!segment.set(start, end)) return eCogoCoincidentPoints;
-  segment.inverse(point, result);
+  inverseToFrame(segment, point, result);
   return eCogoOk;
 }
 
 ECogoMathErrorCode eInverseToArc(const CArc& arc, const C2dPos& point, TElementInverse& result) {
-  if (!isFinite(arc.center) || !isFinite(arc.start) || !isFinite(point) || !arc.isok()) return eCogoInvalidInput;
+  if (!arc.center.isFinite() || !arc.start.isFinite() || !point.isFinite() || !arc.isok()) return eCogoInvalidInput;
   const double radius = arc.getRadius();
   const double relN = point.north() - arc.center.north();
   const double relE = point.east() - arc.center.east();
@@ -102,9 +77,9 @@ ECogoMathErrorCode eInverseToArc(const CArc& arc, const C2dPos& point, TElementI
 ECogoMathErrorCode eInverseToPolyline(const svy_vector<C2dPos>& vertices, bool closed, const C2dPos& point,
                                       TElementInverse& result) {
   const std::size_t count = vertices.size();
-  if (count < 2 || !isFinite(point)) return eCogoInvalidInput;
+  if (count < 2 || !point.isFinite()) return eCogoInvalidInput;
   for (const C2dPos& v : vertices)
-    if (!isFinite(v)) return eCogoInvalidInput;
+    if (!v.isFinite()) return eCogoInvalidInput;
 
   const std::size_t segments = closed ? count : count - 1;
   TElementInverse best;
@@ -112,14 +87,14 @@ ECogoMathErrorCode eInverseToPolyline(const svy_vector<C2dPos>& vertices, bool c
   double lengthBefore = 0.0;
   std::size_t last = 0;  // the last segment with a direction
   for (std::size_t i = 0; i < segments; ++i) {
-    TUnitSegment segment;
+    svy_math::detail::TLineFrame segment;
     if (segment.set(vertices[i], vertices[(i + 1) % count])) last = i;
   }
   for (std::size_t i = 0; i < segments; ++i) {
-    TUnitSegment segment;
+    svy_math::detail::TLineFrame segment;
     if (!segment.set(vertices[i], vertices[(i + 1) % count])) continue;
     TElementInverse candidate;
-    segment.inverse(point, candidate);
+    inverseToFrame(segment, point, candidate);
     if (!found || candidate.distance < best.distance) {
       const bool openStart = !closed && !found;
       const bool openEnd = !closed && i == last;
@@ -144,11 +119,11 @@ ECogoMathErrorCode eInverseToPolyline(const svy_vector<C2dPos>& vertices, bool c
 
 ECogoMathErrorCode ePointAtAlongOffset(const C2dPos& start, const C2dPos& end, double along, double offset,
                                        C2dPos& point) {
-  if (!isFinite(start) || !isFinite(end) || !std::isfinite(along) || !std::isfinite(offset)) return eCogoInvalidInput;
-  TUnitSegment segment;
+  if (!start.isFinite() || !end.isFinite() || !std::isfinite(along) || !std::isfinite(offset)) return eCogoInvalidInput;
+  svy_math::detail::TLineFrame segment;
   if (!segment.set(start, end)) return eCogoCoincidentPoints;
   const C2dPos result = segment.at(along, offset);
-  if (!isFinite(result)) return eCogoInvalidInput;
+  if (!result.isFinite()) return eCogoInvalidInput;
   point = result;
   return eCogoOk;
 }

@@ -8,8 +8,6 @@ namespace CogoFunctions {
 
 namespace {
 
-bool isFinite(const C2dPos& p) { return std::isfinite(p.north()) && std::isfinite(p.east()); }
-
 // The weighted mean relative to the first position; weights null means weight 1 for every position.
 ECogoMathErrorCode meanOf(const svy_vector<C2dPos>& positions, const double* weights, TMeanPosition& result) {
   const std::size_t n = positions.size();
@@ -18,7 +16,7 @@ ECogoMathErrorCode meanOf(const svy_vector<C2dPos>& positions, const double* wei
   double weightSum = 0.0, sumN = 0.0, sumE = 0.0;
   for (std::size_t i = 0; i < n; ++i) {
     const double w = weights ? weights[i] : 1.0;
-    if (!isFinite(positions[i]) || !std::isfinite(w) || !(w > 0.0)) return eCogoInvalidInput;
+    if (!positions[i].isFinite() || !std::isfinite(w) || !(w > 0.0)) return eCogoInvalidInput;
     weightSum += w;
     sumN += w * (positions[i].north() - origin.north());
     sumE += w * (positions[i].east() - origin.east());
@@ -35,7 +33,7 @@ ECogoMathErrorCode meanOf(const svy_vector<C2dPos>& positions, const double* wei
   }
   TMeanPosition out;
   out.mean = C2dPos(origin.north() + meanN, origin.east() + meanE);
-  if (!isFinite(out.mean) || !std::isfinite(squaresN + squaresE)) return eCogoInvalidInput;
+  if (!out.mean.isFinite() || !std::isfinite(squaresN + squaresE)) return eCogoInvalidInput;
   const double sampleFactor = n > 1 ? static_cast<double>(n) / static_cast<double>(n - 1) : 0.0;
   out.sdNorth = std::sqrt(squaresN / weightSum * sampleFactor);
   out.sdEast = std::sqrt(squaresE / weightSum * sampleFactor);
@@ -49,9 +47,9 @@ ECogoMathErrorCode meanOf(const svy_vector<C2dPos>& positions, const double* wei
 
 ECogoMathErrorCode eScaleRotatePoints(svy_vector<C2dPos>& points, const C2dPos& base, double scale,
                                       const CMathAngle& angle) {
-  if (!isFinite(base) || !std::isfinite(scale) || !(scale > 0.0) || !angle.isok()) return eCogoInvalidInput;
+  if (!base.isFinite() || !std::isfinite(scale) || !(scale > 0.0) || !angle.isok()) return eCogoInvalidInput;
   for (const C2dPos& p : points)
-    if (!isFinite(p)) return eCogoInvalidInput;
+    if (!p.isFinite()) return eCogoInvalidInput;
   for (C2dPos& p : points) {
     const double n = p.north() - base.north(), e = p.east() - base.east();
     p = C2dPos(base.north() + scale * angle.getRotatedNorth(n, e), base.east() + scale * angle.getRotatedEast(n, e));

@@ -17,3 +17,5 @@ void registerFitVerbs(CLI::App& app);
 // "svy geo" (geodetic, earth-centred, local east/north/up) and "svy time" (GPS time).
 void registerGeoVerbs(CLI::App& app);
 void registerTimeVerbs(CLI::App& app);
+// "svy traverse": adjustment of a traverse between known points (compass and transit rules).
+void registerTraverseVerbs(CLI::App& app);
