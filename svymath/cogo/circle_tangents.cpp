@@ -34,6 +34,8 @@ CogoFunctions::ECogoMathErrorCode TTangentToCircles::solve(const C2dPos& center1
   if (!line.set(center1, center2))
     return std::isfinite(center2.north() - center1.north()) ? eCogoConcentric : eCogoInvalidInput;
   const double d = line.length;
+  // Circles that coincide within the tangency tolerance share every tangent: none is isolated.
+  if (d <= kTangency && std::fabs(radius1 - radius2) <= kTangency) return eCogoConcentric;
 
   // Outer tangents: the radius to each touching point has the same direction w, with w . u = (r1 - r2) / d.
   const double outerK = radius1 - radius2;

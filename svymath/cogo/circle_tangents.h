@@ -35,17 +35,18 @@ class SVYMATH_API TTangentToCircles {
   // touching the circles on the right of the direction center1 -> center2, then the one on the left.
   // Their number: 4 for separate circles, 3 for circles touching outside (the third is the tangent at the
   // touching point, both its points being that point), 2 for crossing circles, 1 for circles touching
-  // inside, 0 for a circle inside the other (eCogoNoSolution). With a radius 0 the inner tangents are the
-  // outer ones and are not repeated: 2 from a point outside the circle, 1 from a point on it. Concentric
-  // circles give eCogoConcentric; negative or non-finite input eCogoInvalidInput. The previous tangents are
-  // cleared in every case.
+  // inside, 0 for a circle inside the other (eCogoNoSolution). Concentric circles, and circles that coincide
+  // within the tangency tolerance, give eCogoConcentric. With a radius 0 the inner tangents are the outer
+  // ones and are not repeated: 2 from a point outside the circle, 1 from a point on it. Negative or
+  // non-finite input gives eCogoInvalidInput. The previous tangents are cleared in every case.
   CogoFunctions::ECogoMathErrorCode solve(const C2dPos& center1, double radius1, const C2dPos& center2,
                                           double radius2);
   // The tangents from `point` to the circle: solve(point, 0, center, radius).
   CogoFunctions::ECogoMathErrorCode solveFromPoint(const C2dPos& point, const C2dPos& center, double radius);
 
   int count() const { return m_count; }
-  // The tangent at index 0 .. count() - 1 (an index outside gives the first slot, unset after a failure).
+  // The tangent at index 0 .. count() - 1; an index outside reads the first slot, which means nothing when
+  // count() is 0.
   const TTangent& tangent(int index) const { return m_tangents[index >= 0 && index < m_count ? index : 0]; }
 
  private:

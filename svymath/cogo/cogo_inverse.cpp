@@ -85,11 +85,9 @@ ECogoMathErrorCode eInverseToPolyline(const svy_vector<C2dPos>& vertices, bool c
   TElementInverse best;
   bool found = false;
   double lengthBefore = 0.0;
-  std::size_t last = 0;  // the last segment with a direction
-  for (std::size_t i = 0; i < segments; ++i) {
-    svy_math::detail::TLineFrame segment;
-    if (segment.set(vertices[i], vertices[(i + 1) % count])) last = i;
-  }
+  // The last segment with a direction: only its foot may fall beyond the end of an open polyline.
+  std::size_t last = segments - 1;
+  for (svy_math::detail::TLineFrame probe; last > 0 && !probe.set(vertices[last], vertices[(last + 1) % count]);) --last;
   for (std::size_t i = 0; i < segments; ++i) {
     svy_math::detail::TLineFrame segment;
     if (!segment.set(vertices[i], vertices[(i + 1) % count])) continue;

@@ -46,6 +46,12 @@ TEST(TraverseAdjustment, ClosedSquareByBothRules) {
     }
     EXPECT_EQ(result.points.back(), kGrid);
   }
+  // A traverse due east has no northing extent: the transit rule takes its northing misclosure back by
+  // distance, as the compass rule would.
+  TTraverseAdjustment east;
+  ASSERT_TRUE(TProportioning::adjustTraverse(kGrid, C2dPos(kGrid.north() + 0.01, kGrid.east() + 100),
+                                             {{90 * kDegToRad, 60}, {90 * kDegToRad, 40}}, svy_math::eTransitRule, east));
+  EXPECT_NEAR(east.corrections[0].north(), 0.006, 1e-9);
 }
 
 // Legs taken from known points by inverse: nothing to distribute, every point comes back.
