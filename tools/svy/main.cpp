@@ -25,6 +25,7 @@ int main(int argc, char** argv) {
   registerTimeVerbs(app);
   registerLocalizeVerbs(app);
   registerResectVerbs(app);
+  registerTraverseVerbs(app);
 
   try {
     app.parse(argc, argv);

@@ -21,3 +21,5 @@ void registerTimeVerbs(CLI::App& app);
 void registerLocalizeVerbs(CLI::App& app);
 // "svy resect": free-station resection.
 void registerResectVerbs(CLI::App& app);
+// "svy traverse": adjustment of a traverse between known points (compass and transit rules).
+void registerTraverseVerbs(CLI::App& app);
