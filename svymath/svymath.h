@@ -60,3 +60,8 @@
 #include "svymath/formats/sign_strings.h"
 #include "svymath/formats/bearing_text.h"
 #include "svymath/formats/angle_text.h"
+#include "svymath/alignments/alignment_element_base.h"
+#include "svymath/alignments/horz_element_base.h"
+#include "svymath/alignments/alignment_base.h"
+#include "svymath/alignments/alignment_base_impl.h"
+#include "svymath/alignments/horz_alignment_base.h"
