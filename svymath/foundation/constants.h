@@ -262,4 +262,12 @@ constexpr double kUndefinedArcRadius = 1e-6;
 
 }  // namespace tol
 
+// Vertical alignments (profiles).
+namespace units {
+
+// Grades are percent: a grade g rises g / kPercent metres per metre of chainage.
+constexpr double kPercent = 100.0;
+
+}  // namespace units
+
 }  // namespace svy_math
