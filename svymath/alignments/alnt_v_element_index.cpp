@@ -65,6 +65,7 @@ int CAlntElementIndex::walk(const CAlntBase& alignment, double chainage, double*
 int CAlntElementIndex::find(const CAlntBase& alignment, double chainage, double* distance) const {
   const int count = static_cast<int>(m_starts.size());
   if (!m_searchable || count != alignment.getNumOfElements()) return walk(alignment, chainage, distance);
+  if (count == 0) return -1;
   // The last candidate of the walk: the last start <= c (or the first element, within its tolerance).
   int i = static_cast<int>(std::upper_bound(m_starts.begin(), m_starts.end(), chainage) - m_starts.begin()) - 1;
   if (i < 0) i = 0;
