@@ -75,3 +75,5 @@
 #include "svymath/alignments/vertical_ls_with_arc.h"
 #include "svymath/alignments/alnt_v_element_index.h"
 #include "svymath/alignments/alnt_v.h"
+#include "svymath/alignments/alnt_pair.h"
+#include "svymath/alignments/chainage_iterator.h"

@@ -289,4 +289,12 @@ constexpr double kPercent = 100.0;
 
 }  // namespace units
 
+namespace limits {
+
+// Regular stations one chainage iteration yields at most: a million (20 MB of points) covers 10 000 km at
+// 10 m; an absurd interval or range ends the stations there instead of exhausting memory.
+constexpr double kMaxChainageStations = 1.0e6;
+
+}  // namespace limits
+
 }  // namespace svy_math
