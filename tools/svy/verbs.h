@@ -17,3 +17,5 @@ void registerFitVerbs(CLI::App& app);
 // "svy geo" (geodetic, earth-centred, local east/north/up) and "svy time" (GPS time).
 void registerGeoVerbs(CLI::App& app);
 void registerTimeVerbs(CLI::App& app);
+// "svy area": area and perimeter of a boundary of lines and arcs, and its subdivision by a known area.
+void registerAreaVerbs(CLI::App& app);
