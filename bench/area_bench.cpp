@@ -20,7 +20,9 @@ TCoords at(double north, double east) {
 svy_list<AreaSegment> roundBoundary(int count) {
   svy_list<AreaSegment> list;
   const double step = 6.283185307179586 / count;
-  const auto vertex = [&](int i) { return at(5000000.0 + 500.0 * std::cos(i * step), 500000.0 - 500.0 * std::sin(i * step)); };
+  const auto vertex = [&](int i) {
+    return at(5000000.0 + 500.0 * std::cos(i * step), 500000.0 - 500.0 * std::sin(i * step));
+  };
   for (int i = 0; i < count; ++i) {
     if (i % 2 == 0)
       list.emplace_back(vertex(i), vertex(i + 1));
@@ -60,7 +62,8 @@ void BM_SubdivideHinge(benchmark::State& state) {
     svy_list<AreaSegment> list = boundary;
     svy_list<AreaSegment> piece, rest;
     TCoords cutEnd;
-    benchmark::DoNotOptimize(eSubdivideSegmentList(boundary.front().start, towards, 250000.0, list, &piece, &rest, &cutEnd));
+    benchmark::DoNotOptimize(
+        eSubdivideSegmentList(boundary.front().start, towards, 250000.0, list, &piece, &rest, &cutEnd));
   }
 }
 BENCHMARK(BM_SubdivideHinge)->Unit(benchmark::kMillisecond);

@@ -16,7 +16,6 @@
 
 // Bare source names of the area code in the error log.
 constexpr const char* kAreaMathLogSource = "AreaMath";
-constexpr const char* kAreaMathSupportLogSource = "AreaMathSupport";
 constexpr const char* kAreaSubdivisionLogSource = "AreaSubdivisionMath";
 
 // Status of the area functions; only the numbers cross the library boundary.

@@ -19,7 +19,9 @@ namespace {
 struct TFrame {
   explicit TFrame(double azimuth)
       : alongN(std::cos(azimuth)), alongE(std::sin(azimuth)), acrossN(-std::sin(azimuth)), acrossE(std::cos(azimuth)) {}
-  double along(const TCoords& p, const TCoords& o) const { return (p.north - o.north) * alongN + (p.east - o.east) * alongE; }
+  double along(const TCoords& p, const TCoords& o) const {
+    return (p.north - o.north) * alongN + (p.east - o.east) * alongE;
+  }
   double across(const TCoords& p, const TCoords& o) const {
     return (p.north - o.north) * acrossN + (p.east - o.east) * acrossE;
   }
@@ -212,7 +214,7 @@ bool boReorderSegmentList(const svy_list<AreaSegment>& boundary, const TCoords& 
   if (reverse) {
     for (auto it = boundary.rbegin(); it != boundary.rend(); ++it) segments.push_back(getReversedAreaSegment(*it));
   } else {
-    segments.assign(boundary.begin(), boundary.end());
+    for (const AreaSegment& s : boundary) segments.push_back(s);
   }
   const std::size_t n = segments.size();
   for (std::size_t k = 0; k < n; ++k) {

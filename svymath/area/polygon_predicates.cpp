@@ -151,7 +151,8 @@ EAreaCalcStatus eDoAreaSegmentsCross(const svy_list<AreaSegment>& list, bool ign
   // Sweep over the extents in order of their southern edge: only pairs whose extents overlap are tested.
   std::vector<std::size_t> order(segments.size());
   std::iota(order.begin(), order.end(), std::size_t{0});
-  std::sort(order.begin(), order.end(), [&](std::size_t a, std::size_t b) { return boxes[a].minNorth < boxes[b].minNorth; });
+  std::sort(order.begin(), order.end(),
+            [&](std::size_t a, std::size_t b) { return boxes[a].minNorth < boxes[b].minNorth; });
   EAreaCalcStatus found = eAreaCalcOk;
   for (std::size_t k = 0; k < order.size(); ++k) {
     const std::size_t i = order[k];

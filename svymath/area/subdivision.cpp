@@ -28,9 +28,11 @@ EAreaCalcStatus areaOf(const svy_list<AreaSegment>& list, double& area) {
   return eComputePolygonArea(copy, &area);
 }
 
-// Total area of the boundary into `total`: 27 when it cannot be had, 28 below the request, else 0.
+// Total area of the boundary into `total`: 27 when it cannot be had, 28 below the request, 29 for a request
+// that is negative or not a number (no search can reach it), else 0.
 EAreaCalcStatus checkTotal(svy_list<AreaSegment>& boundary, double requested, double& total) {
-  if (eComputePolygonArea(boundary, &total) != eAreaCalcOk) return eAreaCalcTotalAreaFailed;
+  if (eComputePolygonArea(boundary, &total) != eAreaCalcOk || !std::isfinite(total)) return eAreaCalcTotalAreaFailed;
+  if (!(requested >= 0.0)) return eAreaCalcSearchFailed;
   return total < requested ? eAreaCalcAreaTooLarge : eAreaCalcOk;
 }
 

@@ -13,8 +13,9 @@
 // 1e-3 m^2; `rest` the other part; cutStart and cutEnd the cut's ends in the order of the azimuth. The cut
 // is searched by bisection of its distance from the boundary's extreme point across the azimuth; each trial
 // line must cross the boundary exactly twice (other trials are probed around). Returns 20, or 27 (no total
-// area), 28 (more than the total requested), 29 (no bracket, no convergence, a stall). The boundary is
-// changed only as eComputePolygonArea changes it; the pieces are cut from it as it was given.
+// area), 28 (more than the total requested), 29 (a request below 0 or not a number, no bracket, no
+// convergence, a stall). The boundary is changed only as eComputePolygonArea changes it; the pieces are cut
+// from it as it was given.
 SVYMATH_API EAreaCalcStatus eSubdivideSegmentList(const double& azimuth, const double& area, bool pieceOnLeft,
                                                   svy_list<AreaSegment>& boundary, svy_list<AreaSegment>* piece,
                                                   svy_list<AreaSegment>* rest, TCoords* cutStart,

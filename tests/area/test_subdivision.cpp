@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <thread>
 #include <vector>
 
 #include "area_test_support.h"
@@ -42,7 +43,8 @@ std::vector<svy_list<AreaSegment>> boundaries() {
   const TCoords a = ne(n, e), b = ne(n, e + 60), c = ne(n + 100, e + 60), d = ne(n + 100, e);
   svy_list<AreaSegment> arcs{AreaSegment(a, b), AreaSegment(b, c, 80.0, true), AreaSegment(c, d, 40.0, false),
                              AreaSegment(d, a)};
-  svy_list<AreaSegment> halfDisc{AreaSegment(kPi, b, a, false), AreaSegment(a, d), AreaSegment(d, c), AreaSegment(c, b)};
+  svy_list<AreaSegment> halfDisc{AreaSegment(kPi, b, a, false), AreaSegment(a, d), AreaSegment(d, c),
+                                 AreaSegment(c, b)};
   return {polygon({a, b, c, d}), polygon({a, ne(n, e + 90), ne(n + 50, e + 60), ne(n + 50, e + 20)}), arcs, halfDisc};
 }
 
@@ -110,6 +112,11 @@ TEST(ParallelCut, FailureCodes) {
   EXPECT_EQ(eSubdivideSegmentList(0.0, 1.0, true, twoLines, &piece, &rest, &s, &e), eAreaCalcTotalAreaFailed);
   EXPECT_EQ(eSubdivideSegmentList(ne(50, 50), ne(0, 0), 1.0, square, &piece, &rest, &e), eAreaCalcGeometryFailed);
   EXPECT_EQ(eSubdivideSegmentList(ne(0, 0), ne(0, 0), 101.0, square, &piece, &rest, &e), eAreaCalcAreaTooLarge);
+  for (const double bad : {-1.0, std::nan("")}) {
+    EXPECT_EQ(eSubdivideSegmentList(0.0, bad, true, square, &piece, &rest, &s, &e), eAreaCalcSearchFailed);
+    EXPECT_EQ(eSubdivideSegmentList(ne(0, 0), ne(0, 0), bad, square, &piece, &rest, &e), eAreaCalcSearchFailed);
+  }
+  EXPECT_EQ(eSubdivideSegmentList(NAN, 10.0, true, square, &piece, &rest, &s, &e), eAreaCalcSearchFailed);
 }
 
 TEST(HingeCut, PieceGrowsFromTheHingeToTheRequestedArea) {
@@ -212,4 +219,22 @@ TEST(AlignmentArea, BoundaryRoundTripAreaPerimeterAndTasks) {
   CHorzAndVertAlnt bowTie;
   boSetAlignmentFromAreaSegmentList(polygon({ne(0, 0), ne(0, 10), ne(10, 0), ne(10, 10)}), bowTie);
   EXPECT_FALSE(computePolygonArea(bowTie, &area));
+}
+
+TEST(AreaConcurrency, ThreadsSubdivideOneBoundaryAlike) {
+  // Every query works on the caller's copies: threads sharing one boundary get the single-thread answer.
+  const svy_list<AreaSegment> shape = boundaries()[2];
+  const auto cut = [&shape](double area) {
+    svy_list<AreaSegment> boundary = shape, piece, rest;
+    TCoords start, end;
+    return eSubdivideSegmentList(0.4, area, true, boundary, &piece, &rest, &start, &end) == eAreaCalcSubdivided
+               ? start.east
+               : NAN;
+  };
+  const double expected = cut(2500.0);
+  std::vector<double> results(4, 0.0);
+  std::vector<std::thread> threads;
+  for (double& r : results) threads.emplace_back([&r, &cut] { r = cut(2500.0); });
+  for (std::thread& t : threads) t.join();
+  for (double r : results) EXPECT_EQ(r, expected);
 }

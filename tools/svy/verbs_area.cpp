@@ -37,7 +37,8 @@ struct TVertex {
 const svy_tool::RowFormat kBoundaryFormat{{"n", "e", "radius", "direction"}, false, {}, 2};
 
 std::string lower(std::string text) {
-  std::transform(text.begin(), text.end(), text.begin(), [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
+  std::transform(text.begin(), text.end(), text.begin(),
+                 [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
   return text;
 }
 
@@ -102,7 +103,8 @@ bool buildBoundary(const std::vector<TVertex>& vertices, svy_list<AreaSegment>& 
     }
     TCoords centre;
     if (!boComputeCenterPointCoords(v.at, next, v.radius, v.counterClockwise, centre)) {
-      error = "line " + std::to_string(v.lineNumber) + ": no arc of radius " + svy_tool::formatNumber(v.radius, kLengthDecimals) +
+      error = "line " + std::to_string(v.lineNumber) + ": no arc of radius " +
+              svy_tool::formatNumber(v.radius, kLengthDecimals) +
               " reaches the next vertex";
       return false;
     }
