@@ -8,10 +8,13 @@
 // intersection-point element depends on its successor. Between onBulkUpdateStarted and
 // onBulkUpdateFinished edits are not re-anchored (queries see the stale chain); finishing re-anchors all.
 //
-// Access lock (recursive, see CAlntBase): taken by both FindChainageAndOffset forms, the batch query
-// FindChainagesAndOffsets (which also builds the search index under it), and getHLengthInM (it fills the
-// length cache) with everything that reads the length through it. The other queries read only and take no
-// lock. Editing takes no lock: do not edit an alignment while another thread reads it.
+// Access lock (recursive, see CAlntBase): every query of the alignment itself takes it, because the
+// elements fill caches inside their const queries (angles, spiral laws): both FindChainageAndOffset forms,
+// the batch query FindChainagesAndOffsets (which also builds its search index under it), the queries by
+// chainage and their extrapolating forms, FindApproxChainageAndOffset, getHLengthInM and
+// getFinalChainageInM (they fill the length cache), getFinalPosNe, getBoundary, getIpPosForElement and
+// ForEachSegment. An element reached through getHe or getHorzElemAtChain is not guarded: query it from one
+// thread at a time. Editing takes no lock: do not edit an alignment while another thread reads it.
 #include <cstddef>
 #include <memory>
 #include <vector>

@@ -143,6 +143,7 @@ bool CAlntH::FindChainageAndOffset(double north, double east, double& chainage, 
 // point resolved along and across it: a first-order inverse, good near the approximate chainage.
 bool CAlntH::FindApproxChainageAndOffset(double approxChainage, double north, double east, double& chainage,
                                          double& offset) const {
+  CAlntAccessGuard guard(*this);
   if (m_elements.empty()) return false;
   double distance = 0.0;
   const CAlntHe* element = findHeAtChain(approxChainage, &distance, nullptr);

@@ -1,6 +1,11 @@
 #pragma once
 // Internal to the alignment: an R-tree over the plan boxes of an alignment's elements, the candidate source
 // of the batch point-to-chainage query, and the scratch buffers that query reuses from point to point.
+// Boost marks one of its own headers, still included by Boost.Geometry and Boost.Thread, deprecated; the
+// notice is about Boost's internal include, not about ours.
+#ifndef BOOST_ALLOW_DEPRECATED_HEADERS
+#define BOOST_ALLOW_DEPRECATED_HEADERS
+#endif
 #include <cstddef>
 #include <limits>
 #include <utility>

@@ -1,5 +1,6 @@
-// Several threads querying one alignment at once (run under ThreadSanitizer in CI): the searches take the
-// alignment's recursive lock (the batch also builds its index under it), the chainage queries only read.
+// Several threads querying one alignment at once (run under ThreadSanitizer in CI): every query of the
+// alignment takes its recursive lock (the elements fill caches inside const queries), and the batch query
+// builds its index under it.
 #include <gtest/gtest.h>
 
 #include <thread>
