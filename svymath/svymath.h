@@ -72,5 +72,6 @@
 #include "svymath/alignments/horz_element_segment.h"
 #include "svymath/alignments/horz_element_arc.h"
 #include "svymath/alignments/horz_element_spiral.h"
+#include "svymath/alignments/horz_element_ip.h"
 #include "svymath/alignments/alignment_h.h"
 #include "svymath/alignments/station_equations.h"

@@ -9,6 +9,7 @@
 #include "support/geometry.h"
 #include "svymath/alignments/alignment_h.h"
 #include "svymath/alignments/horz_element_arc.h"
+#include "svymath/alignments/horz_element_ip.h"
 #include "svymath/alignments/horz_element_segment.h"
 #include "svymath/alignments/horz_element_spiral.h"
 
@@ -65,6 +66,35 @@ inline CAlntH mixedAlignment(unsigned seed, int curves, double startChainage = 1
     EXPECT_TRUE(alignment.appendElement(tangent(20.0 + 100.0 * unit(rng))));
   }
   return alignment;
+}
+
+inline CAlntHeIp ipElement(const C2dPos& ip, double radius, double lenIn, double lenOut,
+                           AlntMathSpiralType law = eMathSpiralEuler) {
+  CAlntHeIp element;
+  CCurveIp group;
+  group.setSpiralType(law);
+  EXPECT_TRUE(group.setIp(ip.north(), ip.east(), radius, lenIn, lenOut));
+  element.set_data(group);
+  return element;
+}
+
+// Appends `count` intersection points in a random walk from the alignment's end (legs of 600 to 900 m,
+// turns of 20 to 60 degrees either way), each with a curve group; the last one ends the alignment.
+inline void appendIpRun(CAlntH& alignment, unsigned seed, int count) {
+  std::mt19937 rng(seed);
+  std::uniform_real_distribution<double> unit(0.0, 1.0);
+  C2dPos at;
+  CMathAngle heading;
+  EXPECT_TRUE(alignment.getFinalPosNe(at.north(), at.east()) && alignment.getLastHe()->getFinalAzimut(heading));
+  double azDeg = heading.getDeg();
+  for (int i = 0; i < count; ++i) {
+    const double leg = 600.0 + 300.0 * unit(rng);
+    at = C2dPos(at.north() + leg * CMathAngle(azDeg).getCos(), at.east() + leg * CMathAngle(azDeg).getSin());
+    const AlntMathSpiralType law = unit(rng) < 0.7 ? eMathSpiralEuler : eMathSpiralCubic;
+    EXPECT_TRUE(alignment.appendElement(
+        ipElement(at, 300.0 + 500.0 * unit(rng), 30.0 + 50.0 * unit(rng), 30.0 + 50.0 * unit(rng), law)));
+    azDeg += (unit(rng) < 0.5 ? -1.0 : 1.0) * (20.0 + 40.0 * unit(rng));
+  }
 }
 
 }  // namespace alnt_test

@@ -90,6 +90,7 @@ TEST(AlignmentBatch, IndexedAnswersEqualTheScan) {
     std::mt19937 rng(c.seed);
     CAlntH alignment = mixedAlignment(c.seed, c.curves, 250.0 * c.seed, 37.0 * c.seed);
     addKinks(alignment, rng);
+    appendIpRun(alignment, c.seed, c.curves / 2);
     std::vector<double> north, east;
     samplePoints(alignment, rng, north, east);
     expectBatchMatchesSingle(alignment, north, east);
