@@ -107,10 +107,11 @@ class SVYMATH_API CAlntH : public virtual CHorzAlntBase, public CAlntBaseImpl {
   void removeAllHes();
   void copy(const CAlntH& other);
 
-  // Batch point-to-chainage: results[k] answers (north[k], east[k]) exactly as FindChainageAndOffset would
-  // (the seven-argument form when withExtension is true, else the six-argument form), with candidate
-  // elements taken from a spatial index of the elements' boxes, built on first use after an edit. Returns the
-  // number of points found. Holds the access lock for the whole batch.
+  // Batch point-to-chainage over arrays of `count` points: results[k] answers (north[k], east[k]) exactly as
+  // FindChainageAndOffset would (the seven-argument form when withExtension is true, else the six-argument
+  // form), with candidate elements taken from a spatial index of the elements' boxes, built on first use
+  // after an edit. Returns the number of points found (0 for null arrays). Holds the access lock for the
+  // whole batch and reuses its buffers from point to point.
   std::size_t FindChainagesAndOffsets(const double* north, const double* east, std::size_t count,
                                       TAlntStationResult* results, bool withExtension) const;
 

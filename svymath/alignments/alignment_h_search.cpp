@@ -202,6 +202,7 @@ bool CAlntH::findIndexed(double north, double east, bool withExtension, svy_math
 
 std::size_t CAlntH::FindChainagesAndOffsets(const double* north, const double* east, std::size_t count,
                                             TAlntStationResult* results, bool withExtension) const {
+  if (north == nullptr || east == nullptr || results == nullptr) return 0;
   CAlntAccessGuard guard(*this);
   if (!m_searchIndex) {
     std::vector<C2dMinMax> boxes;

@@ -68,6 +68,28 @@ inline CAlntH mixedAlignment(unsigned seed, int curves, double startChainage = 1
   return alignment;
 }
 
+// Each element starts exactly where its predecessor ends, at its final chainage, heading along its final
+// azimuth (within tolerance: a kink-free alignment), and (where every curve has transitions) the curvature
+// runs on through the joint.
+inline void expectContinuousJoints(const CAlntH& alignment, double tolerance, bool withCurvature = true) {
+  for (int i = 1; i < alignment.getNumOfHes(); ++i) {
+    const CAlntHe& before = *alignment.getHe(i - 1);
+    const CAlntHe& after = *alignment.getHe(i);
+    double n1 = 0.0, e1 = 0.0, n2 = 0.0, e2 = 0.0, ch1 = 0.0, ch2 = 0.0, k1 = 0.0, k2 = 0.0;
+    CMathAngle a1, a2;
+    ASSERT_TRUE(before.getFinalPosNe(n1, e1) && after.getStartPosNe(n2, e2));
+    ASSERT_TRUE(before.getFinalChainageInM(ch1) && after.getStartChainageInM(ch2));
+    ASSERT_TRUE(before.getFinalAzimut(a1) && after.getStartAzimut(a2));
+    EXPECT_EQ(ch1, ch2) << i;
+    EXPECT_LE(dist(C2dPos(n1, e1), C2dPos(n2, e2)), tolerance) << i;
+    EXPECT_TRUE(a1.isEqual(a2, tolerance)) << i << ": " << a1.getDeg() << " " << a2.getDeg();
+    ASSERT_TRUE(alignment.getCurvatureAtChainage(ch1 - 1e-7, k1) && alignment.getCurvatureAtChainage(ch1, k2));
+    if (withCurvature) {
+      EXPECT_NEAR(k1, k2, 1e-9) << i;
+    }
+  }
+}
+
 inline CAlntHeIp ipElement(const C2dPos& ip, double radius, double lenIn, double lenOut,
                            AlntMathSpiralType law = eMathSpiralEuler) {
   CAlntHeIp element;
