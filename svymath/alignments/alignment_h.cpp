@@ -11,11 +11,12 @@ using svy_math::tol::kSnap;
 
 SVY_RTTI_DEFINE2(CAlntH, CHorzAlntBase, CAlntBaseImpl)
 
-CAlntH::CAlntH() : m_startNorth(svy_math::undefinedValue()), m_startEast(svy_math::undefinedValue()) {}
+CAlntH::CAlntH()
+    : m_startNorth(svy_math::undefinedValue()), m_startEast(svy_math::undefinedValue()), m_useSearchIndex(true) {}
 
 CAlntH::CAlntH(const CAlntH& other)
     : CRttiBase(), CAlntBase(other), CHorzAlntBase(other), CAlntBaseImpl(other),
-      m_startNorth(other.m_startNorth), m_startEast(other.m_startEast) {
+      m_startNorth(other.m_startNorth), m_startEast(other.m_startEast), m_useSearchIndex(other.m_useSearchIndex) {
   m_elements.reserve(other.m_elements.size());
   for (const CAlntHe* element : other.m_elements) m_elements.push_back(element->clone());
 }
@@ -33,6 +34,7 @@ void CAlntH::copy(const CAlntH& other) {
   CAlntBaseImpl::copy(other);
   m_startNorth = other.m_startNorth;
   m_startEast = other.m_startEast;
+  m_useSearchIndex = other.m_useSearchIndex;
   m_elements.reserve(other.m_elements.size());
   for (const CAlntHe* element : other.m_elements) m_elements.push_back(element->clone());
 }
