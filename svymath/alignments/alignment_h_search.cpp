@@ -135,7 +135,8 @@ bool CAlntH::extendBeyondEnds(double north, double east, bool found, TAlntStatio
     return found;
   }
   resolveAlongAcross(origin, azimuth, north, east, along, across);
-  if (along < 0.0) return found;
+  // Behind the final point (or a point off the number line): no extension.
+  if (!(along >= 0.0)) return found;
   double length = 0.0;
   if ((!found || std::fabs(across) < std::fabs(result.offset)) && getHLengthInM(length)) {
     result = TAlntStationResult{true, distance2Chainage(length + along), across, getNumOfElements() - 1, false, true};
