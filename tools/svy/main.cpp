@@ -23,6 +23,7 @@ int main(int argc, char** argv) {
   registerCurveVerbs(app);
   registerGeoVerbs(app);
   registerTimeVerbs(app);
+  registerProfileVerbs(app);
 
   try {
     app.parse(argc, argv);
