@@ -41,6 +41,7 @@
 #include "svymath/curves/curve_segment.h"
 #include "svymath/curves/curve_arc.h"
 #include "svymath/curves/curve_spiral.h"
+#include "svymath/curves/curve_ip.h"
 #include "svymath/adjustment/matrix_storage.h"
 #include "svymath/adjustment/matrix_products.h"
 #include "svymath/adjustment/matr2_2.h"
