@@ -41,23 +41,23 @@ std::vector<TIndexEntry> toEntries(const std::vector<C2dMinMax>& boxes, std::vec
 CAlntSearchIndex::CAlntSearchIndex(const std::vector<C2dMinMax>& boxes)
     : m_tree(toEntries(boxes, m_always)), m_count(boxes.size()) {}
 
-double CAlntSearchIndex::nearestDistance(const C2dPos& p, TAlntSearchScratch& scratch) const {
+double CAlntSearchIndex::nearestDistance(const C2dPos& p) const {
   const TIndexPoint point(p.north(), p.east());
-  scratch.hits.clear();
-  m_tree.query(bgi::nearest(point, 1), std::back_inserter(scratch.hits));
-  return scratch.hits.empty() ? std::numeric_limits<double>::infinity()
-                              : boost::geometry::distance(point, scratch.hits.front().first);
+  m_hits.clear();
+  m_tree.query(bgi::nearest(point, 1), std::back_inserter(m_hits));
+  return m_hits.empty() ? std::numeric_limits<double>::infinity() : boost::geometry::distance(point, m_hits.front().first);
 }
 
-void CAlntSearchIndex::collect(const C2dPos& p, double radius, TAlntSearchScratch& scratch) const {
-  scratch.hits.clear();
-  scratch.candidates.clear();
+const std::vector<int>& CAlntSearchIndex::collect(const C2dPos& p, double radius) const {
+  m_hits.clear();
+  m_candidates.clear();
   const TIndexBox square(TIndexPoint(p.north() - radius, p.east() - radius),
                          TIndexPoint(p.north() + radius, p.east() + radius));
-  m_tree.query(bgi::intersects(square), std::back_inserter(scratch.hits));
-  for (const TIndexEntry& hit : scratch.hits) scratch.candidates.push_back(hit.second);
-  scratch.candidates.insert(scratch.candidates.end(), m_always.begin(), m_always.end());
-  std::sort(scratch.candidates.begin(), scratch.candidates.end());
+  m_tree.query(bgi::intersects(square), std::back_inserter(m_hits));
+  for (const TIndexEntry& hit : m_hits) m_candidates.push_back(hit.second);
+  m_candidates.insert(m_candidates.end(), m_always.begin(), m_always.end());
+  std::sort(m_candidates.begin(), m_candidates.end());
+  return m_candidates;
 }
 
 }  // namespace detail
