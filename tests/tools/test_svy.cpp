@@ -104,6 +104,8 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
       {"profile height", "--pvi"}, {"profile height --pvi 0,100", "at least two"},
       {"profile height --pvi 0,100 --pvi 50", "CH,H[,L]"},
       {"profile height --pvi 0,100 --pvi 100,101,150 --pvi 150,100", "must not overlap"},
+      {"cogo intersect --mode xy", "--mode"}, {"traverse adjust", "--start"}, {"traverse adjust --start 1", "--start"},
+      {"traverse adjust --start 0,0 --rule simple", "--rule"},
   };
   for (const auto& [args, message] : cases) {
     SCOPED_TRACE(args);
@@ -116,7 +118,8 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
   }
   const SvyResult help = runSvy({"--help"});
   EXPECT_EQ(help.exitStatus, 0);
-  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "profile"}) {
+  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "traverse",
+                             "profile"}) {
     EXPECT_NE(help.out.find(family), std::string::npos) << family;
   }
 }

@@ -24,6 +24,9 @@ int main(int argc, char** argv) {
   registerGeoVerbs(app);
   registerTimeVerbs(app);
   registerProfileVerbs(app);
+  registerLocalizeVerbs(app);
+  registerResectVerbs(app);
+  registerTraverseVerbs(app);
 
   try {
     app.parse(argc, argv);

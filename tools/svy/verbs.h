@@ -19,3 +19,9 @@ void registerGeoVerbs(CLI::App& app);
 void registerTimeVerbs(CLI::App& app);
 // "svy profile": heights and grades of a profile given by its vertical intersection points.
 void registerProfileVerbs(CLI::App& app);
+// "svy localize": plane localization (site calibration) fit and apply.
+void registerLocalizeVerbs(CLI::App& app);
+// "svy resect": free-station resection.
+void registerResectVerbs(CLI::App& app);
+// "svy traverse": adjustment of a traverse between known points (compass and transit rules).
+void registerTraverseVerbs(CLI::App& app);
