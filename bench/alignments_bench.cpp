@@ -1,6 +1,7 @@
 // Point to chainage on horizontal alignments of 10, 100 and 1000 elements of every kind (tangents, arcs,
 // clothoid and cubic transitions, intersection-point groups), for points scattered within 50 m of the centre
-// line: the batch query through the spatial index, and the single-point search that scans every element.
+// line: the batch query and the single-point query, both through the spatial index, and the single-point
+// query projecting every element (index switched off).
 #include <benchmark/benchmark.h>
 
 #include <random>
@@ -85,8 +86,9 @@ void BM_AlignmentBatchStation(benchmark::State& state) {
   state.SetItemsProcessed(state.iterations() * static_cast<long>(c.north.size()));
 }
 
-void BM_AlignmentFindChainageAndOffset(benchmark::State& state) {
-  const TCase c = makeCase(static_cast<int>(state.range(0)));
+void findOneByOne(benchmark::State& state, bool useIndex) {
+  TCase c = makeCase(static_cast<int>(state.range(0)));
+  c.alignment.setUseSearchIndex(useIndex);
   std::size_t i = 0;
   for (auto _ : state) {
     double chainage = 0.0, offset = 0.0;
@@ -97,7 +99,11 @@ void BM_AlignmentFindChainageAndOffset(benchmark::State& state) {
   state.SetItemsProcessed(state.iterations());
 }
 
+void BM_AlignmentFindChainageAndOffset(benchmark::State& state) { findOneByOne(state, true); }
+void BM_AlignmentFindChainageAndOffsetScan(benchmark::State& state) { findOneByOne(state, false); }
+
 }  // namespace
 
 BENCHMARK(BM_AlignmentBatchStation)->Arg(10)->Arg(100)->Arg(1000);
 BENCHMARK(BM_AlignmentFindChainageAndOffset)->Arg(10)->Arg(100)->Arg(1000);
+BENCHMARK(BM_AlignmentFindChainageAndOffsetScan)->Arg(10)->Arg(100)->Arg(1000);

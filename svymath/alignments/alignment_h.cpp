@@ -162,6 +162,7 @@ double degreesOrZero(const CMathAngle& azimuth) { return azimuth.isNan() ? 0.0 :
 bool CAlntH::getPosNeAtChainAndOffsetExtr(double chainage, double offset, double& north, double& east,
                                           bool* extrapolated) const {
   CAlntAccessGuard guard(*this);
+  if (std::isnan(chainage) || std::isnan(offset)) return false;
   double finalChainage = 0.0;
   if (!getFinalChainageInM(finalChainage)) return false;
   const double startChainage = getStoredStartChainageInM();
@@ -198,6 +199,7 @@ bool CAlntH::getPosNeAtChainAndOffsetExtr(double chainage, double offset, double
 
 bool CAlntH::getAzimuthAtChainExtr(double chainage, double& azimuthDeg) const {
   CAlntAccessGuard guard(*this);
+  if (std::isnan(chainage)) return false;
   if (getAzimuthAtChain(chainage, azimuthDeg)) return true;
   double finalChainage = 0.0;
   if (!getFinalChainageInM(finalChainage)) return false;

@@ -140,6 +140,10 @@ class SVYMATH_API CAlntH : public virtual CHorzAlntBase, public CAlntBaseImpl {
   bool findPoint(double north, double east, bool withExtension, TAlntStationResult& result) const;
   // The on-alignment search over the elements near the point (the index is built first when missing).
   bool findThroughIndex(double north, double east, TAlntStationResult& result) const;
+  // An element's distance bound and its foot for the point; with `remembered` through the index's record of
+  // what the element answered earlier for the same point.
+  bool elementDistance(int index, double north, double east, bool remembered, double& distance) const;
+  bool elementFoot(int index, double north, double east, bool remembered, double& along, double& offset) const;
   // Step two and three of the seven-argument form: the extensions beyond the two ends.
   bool extendBeyondEnds(double north, double east, bool found, TAlntStationResult& result) const;
   void deleteElements();

@@ -46,13 +46,13 @@ bool CAlntH::findOnAlignment(double north, double east, const std::vector<int>* 
     const int i = candidates != nullptr ? (*candidates)[k] : static_cast<int>(k);
     const CAlntHe* element = m_elements[static_cast<std::size_t>(i)];
     double distance = 0.0;
-    if (best.found && element->getShortestDistanceToPoint(north, east, distance) &&
+    if (best.found && elementDistance(i, north, east, candidates != nullptr, distance) &&
         distance > std::fabs(best.offset) + kSnap) {
       continue;
     }
     double along = 0.0;
     double off = 0.0;
-    if (element->getLengthAndOffset(north, east, along, off)) {
+    if (elementFoot(i, north, east, candidates != nullptr, along, off)) {
       double chainage = 0.0;
       if ((!best.found || std::fabs(off) <= std::fabs(best.offset) + kSnap) &&
           element->distance2Chainage(along, chainage)) {
@@ -89,6 +89,31 @@ bool CAlntH::findOnAlignment(double north, double east, const std::vector<int>* 
   return best.found;
 }
 
+bool CAlntH::elementDistance(int index, double north, double east, bool remembered, double& distance) const {
+  const CAlntHe* element = m_elements[static_cast<std::size_t>(index)];
+  if (!remembered) return element->getShortestDistanceToPoint(north, east, distance);
+  svy_math::detail::TAlntElementAnswer& answer = m_searchIndex->answer(index);
+  if (answer.distanceStamp != m_searchIndex->stamp()) {
+    answer.distanceOk = element->getShortestDistanceToPoint(north, east, answer.distance);
+    answer.distanceStamp = m_searchIndex->stamp();
+  }
+  distance = answer.distance;
+  return answer.distanceOk;
+}
+
+bool CAlntH::elementFoot(int index, double north, double east, bool remembered, double& along, double& offset) const {
+  const CAlntHe* element = m_elements[static_cast<std::size_t>(index)];
+  if (!remembered) return element->getLengthAndOffset(north, east, along, offset);
+  svy_math::detail::TAlntElementAnswer& answer = m_searchIndex->answer(index);
+  if (answer.footStamp != m_searchIndex->stamp()) {
+    answer.footOk = element->getLengthAndOffset(north, east, answer.along, answer.offset);
+    answer.footStamp = m_searchIndex->stamp();
+  }
+  along = answer.along;
+  offset = answer.offset;
+  return answer.footOk;
+}
+
 // Beyond the start along the first element's start tangent, beyond the end along the last element's final
 // tangent; an extension wins only when strictly nearer than what was found on the alignment.
 bool CAlntH::extendBeyondEnds(double north, double east, bool found, TAlntStationResult& result) const {
@@ -110,7 +135,8 @@ bool CAlntH::extendBeyondEnds(double north, double east, bool found, TAlntStatio
     return found;
   }
   resolveAlongAcross(origin, azimuth, north, east, along, across);
-  if (along < 0.0) return found;
+  // Behind the final point (or a point off the number line): no extension.
+  if (!(along >= 0.0)) return found;
   double length = 0.0;
   if ((!found || std::fabs(across) < std::fabs(result.offset)) && getHLengthInM(length)) {
     result = TAlntStationResult{true, distance2Chainage(length + along), across, getNumOfElements() - 1, false, true};
@@ -187,6 +213,7 @@ bool CAlntH::findThroughIndex(double north, double east, TAlntStationResult& res
     for (const CAlntHe* element : m_elements) boxes.push_back(element->getBoundary());
     m_searchIndex.reset(new svy_math::detail::CAlntSearchIndex(boxes));
   }
+  m_searchIndex->beginPoint();
   const C2dPos point(north, east);
   // A point off the number line is left to the plain scan, which finds nothing for it.
   double radius = std::isfinite(north) && std::isfinite(east)

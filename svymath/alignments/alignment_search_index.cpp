@@ -39,7 +39,15 @@ std::vector<TIndexEntry> toEntries(const std::vector<C2dMinMax>& boxes, std::vec
 // The packing constructor bulk-loads the tree (sort-tile-recursive), which also gives better queries than
 // inserting one box after another.
 CAlntSearchIndex::CAlntSearchIndex(const std::vector<C2dMinMax>& boxes)
-    : m_tree(toEntries(boxes, m_always)), m_count(boxes.size()) {}
+    : m_tree(toEntries(boxes, m_always)), m_count(boxes.size()), m_answers(boxes.size()), m_stamp(0) {}
+
+// Stamps run from 1; after the last one every answer is cleared and the stamps start again.
+void CAlntSearchIndex::beginPoint() const {
+  if (++m_stamp == 0) {
+    for (TAlntElementAnswer& answer : m_answers) answer = TAlntElementAnswer();
+    m_stamp = 1;
+  }
+}
 
 double CAlntSearchIndex::nearestDistance(const C2dPos& p) const {
   const TIndexPoint point(p.north(), p.east());

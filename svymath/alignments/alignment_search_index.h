@@ -42,6 +42,18 @@ struct TAlntSearchTrace {
   }
 };
 
+// What one element answered for the current point (its distance bound and its foot), kept so that a search
+// repeated over a wider square does not project the element again. Valid while its stamp is the index's.
+struct TAlntElementAnswer {
+  unsigned distanceStamp = 0;
+  bool distanceOk = false;
+  double distance = 0.0;
+  unsigned footStamp = 0;
+  bool footOk = false;
+  double along = 0.0;
+  double offset = 0.0;
+};
+
 class CAlntSearchIndex {
  public:
   // Box i belongs to element i; an empty box (an element without a defined shape) makes its element a
@@ -54,6 +66,10 @@ class CAlntSearchIndex {
   // The elements whose grown boxes meet the square of half-side `radius` about p, with those of undefined
   // shape, in ascending order (valid until the next call).
   const std::vector<int>& collect(const C2dPos& p, double radius) const;
+  // Forgets the elements' answers to the previous point.
+  void beginPoint() const;
+  TAlntElementAnswer& answer(int element) const { return m_answers[static_cast<std::size_t>(element)]; }
+  unsigned stamp() const { return m_stamp; }
 
  private:
   boost::geometry::index::rtree<TIndexEntry, boost::geometry::index::rstar<16>> m_tree;
@@ -61,6 +77,8 @@ class CAlntSearchIndex {
   std::size_t m_count;
   mutable std::vector<TIndexEntry> m_hits;
   mutable std::vector<int> m_candidates;
+  mutable std::vector<TAlntElementAnswer> m_answers;
+  mutable unsigned m_stamp;
 };
 
 }  // namespace detail

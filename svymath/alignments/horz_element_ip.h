@@ -33,6 +33,8 @@ class SVYMATH_API CAlntHeIp : public CAlntHe {
   CAlntHeIp& operator=(const CAlntHeIp& other);
   ~CAlntHeIp() override;
 
+  void copy(const CAlntHeIp& other) { *this = other; }
+
   // The IP (northing, easting), the arc radius (metres, sign ignored: the turn comes from the tangents)
   // and the entry and exit spiral lengths (metres): CCurveIp::setIp's five values in that order.
   bool setIp(double ipNorth, double ipEast, double radius, double lenIn, double lenOut);

@@ -278,3 +278,21 @@ TEST(AlignmentGeometry, BoundaryIntersectionPointsAndSegments) {
   EXPECT_EQ(counter.count, alignment.getNumOfHes());
   EXPECT_NE(CAlntH::cast(static_cast<const CHorzAlntBase*>(&alignment)), nullptr);
 }
+
+// Points and chainages off the number line find nothing; huge ones end in a plain answer, never a hang.
+TEST(AlignmentRobustness, AbsurdInput) {
+  CAlntH alignment = mixedAlignment(13, 2);
+  appendIpRun(alignment, 13, 2);
+  for (const double v : {std::nan(""), HUGE_VAL, -HUGE_VAL, 1e300, -1e300}) {
+    double c = 0.0, o = 0.0, n = 0.0, e = 0.0;
+    bool extrapolated = false;
+    TAlntStationResult result;
+    EXPECT_FALSE(alignment.getPosNeAtChain(v, n, e)) << v;
+    const bool found = alignment.FindChainageAndOffset(kNorth0, v, c, o, extrapolated);
+    alignment.FindChainagesAndOffsets(&v, &v, 1, &result, true);
+    if (std::isnan(v)) {
+      EXPECT_FALSE(found || result.found || alignment.FindChainageAndOffset(v, kEast0, c, o) ||
+                   alignment.getPosNeAtChainAndOffsetExtr(v, 0.0, n, e));
+    }
+  }
+}
