@@ -24,8 +24,7 @@ bool isDefinedByPoints(const CAlntVe& element) {
 CVertAlntBase::~CVertAlntBase() = default;
 
 // A vertical alignment holds vertical elements only.
-const CAlntVe* CVertAlntBase::getVe(int index) const { return static_cast<const CAlntVe*>(
-    static_cast<const CVertAlntElemBase*>(getElement(index))); }
+const CAlntVe* CVertAlntBase::getVe(int index) const { return static_cast<const CAlntVe*>(getElement(index)); }
 
 CAlntV::CAlntV() : m_startHeight(svy_math::undefinedValue()) {}
 
@@ -141,7 +140,8 @@ bool CAlntV::getHeightAtChainExtr(double chainage, double& height, bool& extrapo
     return true;
   }
   double finalChainage = 0.0;
-  if (m_elements.empty() || !getFinalChainageInM(finalChainage)) return false;
+  // A chainage off the number line has no height, not an infinite one.
+  if (!std::isfinite(chainage) || m_elements.empty() || !getFinalChainageInM(finalChainage)) return false;
   double h = 0.0;
   const double distance = chainage2Distance(chainage);
   if (chainage < finalChainage) {
