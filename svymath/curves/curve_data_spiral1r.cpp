@@ -286,9 +286,13 @@ double CCurveDataSpiral1R::getFinalAzimutInRad() const {
   return GetAzimuth(getTotalLength()) * svy_math::units::kDegToRad;
 }
 
-double CCurveDataSpiral1R::getRadius() const { return m_isTSSC ? m_law->getRadius() : -m_law->getRadius(); }
+double CCurveDataSpiral1R::getRadius() const {
+  if (!m_law->isok()) return 0.0;
+  return m_isTSSC ? m_law->getRadius() : -m_law->getRadius();
+}
 
 double CCurveDataSpiral1R::getSpiralParam() const {
+  if (!m_law->isok()) return 0.0;
   return std::sqrt(std::fabs(m_law->getRadius() * m_law->getLength()));
 }
 
