@@ -362,6 +362,20 @@ TEST(BestFitRadius, ConvergesAfterOneZeroCorrection) {
   EXPECT_NEAR(solution[0], meanDistance, 1e-9);
   EXPECT_NEAR(solution[0], 80.0, 0.003);
 
+  // Distances 9, 10, 12 and 13 fit the radius 11 with misclosures -2, -1, 1, 2: the RMS is sqrt(10 / 4), taken
+  // over the n observations (the residual count, not n - 1). The line's residuals +-1 give 1 likewise.
+  TBestFitRadiusData spread;
+  spread.setCircleCenter(centre);
+  for (double d : {9.0, 10.0, 12.0, 13.0}) spread.addData(C2dPos(centre.north() + d, centre.east()));
+  spread.setConvergenceCriteria(svy_vector<double>{1e-9});
+  ASSERT_EQ(svy_math::gaussNewtonLeastSquares(solution, spread), svy_math::eLsqOk);
+  EXPECT_NEAR(solution[0], 11.0, 1e-9);
+  EXPECT_NEAR(spread.getMisclosureRms(), std::sqrt(2.5), 1e-9);
+  TBestFitLineData line;
+  for (const C2dPos& p : {C2dPos(1, 0), C2dPos(-1, 0), C2dPos(2, 1), C2dPos(0, 1)}) line.addData(p);
+  ASSERT_EQ(svy_math::leastSquares(solution, line), svy_math::eLsqOk);
+  EXPECT_NEAR(line.getRms(solution), 1.0, 1e-14);
+
   TBestFitRadiusData bare;
   EXPECT_EQ(bare.computeInitialGuess(), svy_math::eLsqTooFewObservations);
   bare.addData(C2dPos(1, 1));
