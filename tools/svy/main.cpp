@@ -23,6 +23,9 @@ int main(int argc, char** argv) {
   registerCurveVerbs(app);
   registerGeoVerbs(app);
   registerTimeVerbs(app);
+  registerLocalizeVerbs(app);
+  registerResectVerbs(app);
+  registerTraverseVerbs(app);
 
   try {
     app.parse(argc, argv);
