@@ -1,5 +1,6 @@
 #include "svymath/curves/spiral_fresnel.h"
 
+#include <array>
 #include <cmath>
 #include <cstddef>
 
@@ -130,6 +131,23 @@ constexpr TAuxiliaryPiece kPieces[] = {
      }},
 };
 
+// The map u -> v of each piece as v = u * scale - shift, so that evaluating it takes no division.
+struct TPieceMap {
+  double scale;
+  double shift;
+};
+constexpr std::size_t kPieceCount = sizeof(kPieces) / sizeof(kPieces[0]);
+constexpr std::array<TPieceMap, kPieceCount> makePieceMaps() {
+  std::array<TPieceMap, kPieceCount> maps{};
+  for (std::size_t p = 0; p < kPieceCount; ++p) {
+    const double width = kPieces[p].uHigh - kPieces[p].uLow;
+    maps[p] = {2.0 / width, (kPieces[p].uHigh + kPieces[p].uLow) / width};
+  }
+  return maps;
+}
+constexpr std::array<TPieceMap, kPieceCount> kPieceMaps = makePieceMaps();
+constexpr double kInversePi = 0.3183098861837907;
+
 // Asymptotic series of F and G in w = 1/(pi x^2)^2:
 //   F = sum (-1)^k 1*3*5*...*(4k-1) w^k,  G = sum (-1)^k 1*3*5*...*(4k+1) w^k.
 constexpr std::size_t kAsymptoticTerms = 9;
@@ -137,6 +155,14 @@ constexpr double kAsymptoticF[kAsymptoticTerms] = {1.0, -3.0, 105.0, -10395.0, 2
                                                    316234143225.0, -213458046676875.0, 1.9189878396251062e17};
 constexpr double kAsymptoticG[kAsymptoticTerms] = {1.0, -15.0, 945.0, -135135.0, 34459425.0, -13749310575.0,
                                                    7905853580625.0, -6190283353629375.0, 6.332659870762851e18};
+
+// Taylor series of sin(a) / a and cos(a) in a^2 for |a| <= pi/4: the first omitted terms are below 1e-19.
+constexpr double kSinSeries[9] = {1.0, -0.16666666666666666, 0.008333333333333333, -0.0001984126984126984,
+                                  2.7557319223985893e-06, -2.505210838544172e-08, 1.6059043836821613e-10,
+                                  -7.647163731819816e-13, 2.8114572543455206e-15};
+constexpr double kCosSeries[10] = {1.0, -0.5, 0.041666666666666664, -0.001388888888888889,
+                                   2.48015873015873e-05, -2.755731922398589e-07, 2.08767569878681e-09,
+                                   -1.1470745597729725e-11, 4.779477332387385e-14, -1.5619206968586225e-16};
 
 // A polynomial sum(c[k] v^k) by Estrin's scheme: pairs first, then pairs of pairs with v^2, v^4, ... The
 // dependency chain is log2(N) multiply-adds long instead of Horner's N.
@@ -184,11 +210,15 @@ void phaseCosSin(double x, double& c, double& s) {
   double hi = 0.0;
   double lo = 0.0;
   exactSquare(x, hi, lo);
-  const double r = hi - 4.0 * std::floor(0.25 * hi);  // exact, in [0, 4)
-  const double quarter = std::floor(r + 0.5);
-  const double angle = units::kHalfPi * ((r - quarter) + lo);  // |angle| <= pi/4 (plus rounding)
-  const double ca = std::cos(angle);
-  const double sa = std::sin(angle);
+  // Both parts modulo 4, exactly: lo is below half a unit of hi's last place, which exceeds 4 once x^2
+  // passes 2^54; below 4 it is left as it is (adding 4 to a tiny lo would round it away).
+  const double rHi = hi - 4.0 * std::floor(0.25 * hi);
+  const double rLo = std::fabs(lo) < 4.0 ? lo : lo - 4.0 * std::floor(0.25 * lo);
+  const double quarter = std::floor(rHi + rLo + 0.5);
+  const double angle = units::kHalfPi * ((rHi - quarter) + rLo);  // |angle| <= pi/4 (plus rounding)
+  const double angle2 = angle * angle;
+  const double ca = polynomial(kCosSeries, angle2);
+  const double sa = angle * polynomial(kSinSeries, angle2);
   switch (static_cast<int>(quarter) & 3) {
     case 0: c = ca, s = sa; break;
     case 1: c = -sa, s = ca; break;
@@ -204,24 +234,25 @@ void fresnelAuxiliary(double x, double& S, double& C) {
     S = C = 0.5;
     return;
   }
+  // One division: 1/(pi x); then u = 1/x^2 = (pi / (pi x))^2 and w = 1/(pi x^2)^2 = (u / pi)^2.
+  const double inversePiX = 1.0 / (units::kPi * x);
+  const double u = (units::kPi * inversePiX) * (units::kPi * inversePiX);
   double bigF = 0.0;
   double bigG = 0.0;
   if (x < kAsymptoticFrom) {
     std::size_t p = 0;
     while (x >= kPieces[p].xEnd) ++p;
     const TAuxiliaryPiece& piece = kPieces[p];
-    const double v = (2.0 / (x * x) - (piece.uLow + piece.uHigh)) / (piece.uHigh - piece.uLow);
+    const double v = u * kPieceMaps[p].scale - kPieceMaps[p].shift;
     bigF = polynomial(piece.f, v);
     bigG = polynomial(piece.g, v);
   } else {
-    const double pix2 = units::kPi * x * x;
-    const double w = 1.0 / (pix2 * pix2);
+    const double w = (inversePiX * inversePiX) * (inversePiX * inversePiX) * (units::kPi * units::kPi);
     bigF = polynomial(kAsymptoticF, w);
     bigG = polynomial(kAsymptoticG, w);
   }
-  const double pix = units::kPi * x;
-  const double f = bigF / pix;
-  const double g = bigG / (pix * pix * x);
+  const double f = bigF * inversePiX;
+  const double g = bigG * inversePiX * u * kInversePi;
   double c = 0.0;
   double s = 0.0;
   phaseCosSin(x, c, s);

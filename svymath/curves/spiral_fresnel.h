@@ -6,8 +6,9 @@
 
 namespace svy_math {
 
-// Writes S(t) and C(t), within 3 units of the last place of each for every finite t (measured against
-// 40-digit values: at most 2.3e-16 relative): a power series below |t| = 1.5, above it the auxiliary
+// Writes S(t) and C(t) with a relative error below 4 * 2^-52 (8.9e-16) for every finite t; measured against
+// 40-digit values the worst is 3.04 * 2^-52 just below |t| = 1.5, where the power series sums terms three
+// times the result, and 1 * 2^-52 above it. A power series below |t| = 1.5, above it the auxiliary
 // functions f and g (C = 1/2 + f sin - g cos, S = 1/2 - f cos - g sin of pi t^2/2) by fitted polynomials up
 // to 7 and their asymptotic series beyond, with the phase reduced exactly. An infinite t gives the limits
 // (+-1/2), NaN gives NaN.
