@@ -164,22 +164,20 @@ constexpr double kCosSeries[10] = {1.0, -0.5, 0.041666666666666664, -0.001388888
                                    2.48015873015873e-05, -2.755731922398589e-07, 2.08767569878681e-09,
                                    -1.1470745597729725e-11, 4.779477332387385e-14, -1.5619206968586225e-16};
 
-// A polynomial sum(c[k] v^k) by Estrin's scheme: pairs first, then pairs of pairs with v^2, v^4, ... The
-// dependency chain is log2(N) multiply-adds long instead of Horner's N.
+// A polynomial sum(c[k] v^k) by Estrin's scheme: neighbouring coefficients are paired first,
+// c[2k] + c[2k+1] v, and the pairs form a polynomial in v^2, down to one value. The dependency chain is
+// log2(N) multiply-adds long instead of Horner's N, and an alternating series cancels within each pair
+// while its terms are still small.
 template <std::size_t N>
 double polynomial(const double (&c)[N], double v) {
-  double level[N];
-  for (std::size_t k = 0; k < N; ++k) level[k] = c[k];
-  std::size_t size = N;
-  double power = v;
-  while (size > 1) {
-    const std::size_t pairs = size / 2;
-    for (std::size_t k = 0; k < pairs; ++k) level[k] = level[2 * k] + level[2 * k + 1] * power;
-    if (size % 2 != 0) level[pairs] = level[size - 1];
-    size = (size + 1) / 2;
-    power *= power;
+  if constexpr (N == 1) {
+    return c[0];
+  } else {
+    double pairs[(N + 1) / 2];
+    for (std::size_t k = 0; k < N / 2; ++k) pairs[k] = c[2 * k] + c[2 * k + 1] * v;
+    if constexpr (N % 2 != 0) pairs[N / 2] = c[N - 1];
+    return polynomial(pairs, v * v);
   }
-  return level[0];
 }
 
 void fresnelSeries(double x, double& S, double& C) {
