@@ -26,6 +26,7 @@ int main(int argc, char** argv) {
   registerLocalizeVerbs(app);
   registerResectVerbs(app);
   registerTraverseVerbs(app);
+  registerViewVerbs(app);
 
   try {
     app.parse(argc, argv);
