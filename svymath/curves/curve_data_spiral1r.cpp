@@ -19,12 +19,9 @@ constexpr int kSpiralDataType = 2;
 // sampled at this many intervals to bracket every foot point (a spiral turns by less than a quarter turn
 // over a sample interval, so each interval holds at most one minimum of the distance).
 constexpr int kProjectionSamples = 32;
-// Largest turn of a projection piece (radians): pieces of equal length of a clothoid turn by at most twice
-// the mean, so a piece turns by at most a quarter turn, well inside the half turn that keeps the
-// stationary points of the distance to two.
-constexpr double kPieceTurn = 0.7853981633974483;  // pi/4
-// Largest curvature times length of a projection piece: points within half the radius of a piece then pass
-// the bound that rules out a hidden minimum.
+// Largest sharpest curvature times length of a projection piece: a piece then turns by at most half a
+// radian (well inside the half turn that keeps the stationary points of the distance to two), and points
+// within half the radius of it pass the bound that rules out a hidden minimum.
 constexpr double kPieceCurvatureLength = 0.5;
 // Cap of the refinement in one bracket. Newton converges in a handful of steps and the bisection fallback
 // halves the bracket each step, so 100 steps reach below kProjectionLength for any bracket up to 1e20 m.
@@ -241,22 +238,22 @@ bool CCurveDataSpiral1R::refineFoot(double north, double east, double a, double 
   return componentsAt(north, east, s, candidate.along, candidate.offset);
 }
 
+double CCurveDataSpiral1R::sharpestCurvature() const { return 1.0 / std::fabs(m_law->getRadius()); }
+
 int CCurveDataSpiral1R::projectionPieces(double total) const {
-  const double turn = std::fabs(GetAzimuth(total)) * svy_math::units::kDegToRad;
-  const double sharpest = std::fmax(std::fabs(getCurvatureAtLength(0.0)), std::fabs(getCurvatureAtLength(total)));
-  const double pieces = std::ceil(std::fmax(turn / kPieceTurn, sharpest * total / kPieceCurvatureLength));
+  const double pieces = std::ceil(sharpestCurvature() * total / kPieceCurvatureLength);
   if (!(pieces <= kProjectionSamples)) return 0;
   return pieces < 1.0 ? 1 : static_cast<int>(pieces);
 }
 
-// The element is cut into pieces that turn by at most a quarter turn. The curvature of a spiral is monotone,
+// The element is cut into pieces that turn by at most half a radian. The curvature of a spiral is monotone,
 // so its centres of curvature form a convex arc; the normals of a piece are the tangents of that arc, and at
 // most two of them pass through any point: the distance from the point has at most two stationary lengths
 // on a piece. When the along component falls through zero between the ends of a piece, that is its one
 // minimum. When it has the same sign at both ends there is none, unless the point lies beyond a centre of
 // curvature of the piece (curvature * offset > 1 somewhere on it). The offsets on a piece are bounded by the
-// distances to its ends and its length; where that bound cannot exclude a hidden minimum, the element is
-// searched again at kProjectionSamples intervals.
+// distances to its ends and its length, the curvature by that of the law's sharp end; where these bounds
+// cannot exclude a hidden minimum, the element is searched again at kProjectionSamples intervals.
 bool CCurveDataSpiral1R::findFoot(double north, double east, TFoot& foot) const {
   const double total = getTotalLength();
   if (!isok() || !(total >= 0.0) || !std::isfinite(total)) return false;
@@ -272,29 +269,27 @@ CCurveDataSpiral1R::EFootScan CCurveDataSpiral1R::scanFoot(double north, double 
                                                            bool boundPieces, TFoot& foot) const {
   TFoot best;
   if (!componentsAt(north, east, 0.0, best.along, best.offset)) return EFootScan::kFailed;
+  const double sharpest = boundPieces ? sharpestCurvature() : 0.0;
   double lo = 0.0;
   double loAlong = best.along;
   double loDistance = best.distance();
-  double loCurvature = std::fabs(getCurvatureAtLength(0.0));
   for (int i = 1; i <= intervals; ++i) {
     const double hi = total * i / intervals;
     TFoot sample;
     sample.length = hi;
     if (!componentsAt(north, east, hi, sample.along, sample.offset)) return EFootScan::kFailed;
     if (i == intervals && sample.distance() < best.distance()) best = sample;
-    const double hiCurvature = boundPieces ? std::fabs(getCurvatureAtLength(hi)) : 0.0;
     if (loAlong > 0.0 && sample.along <= 0.0) {
       TFoot candidate;
       if (!refineFoot(north, east, lo, hi, loAlong, sample.along, candidate)) return EFootScan::kFailed;
       if (candidate.distance() < best.distance()) best = candidate;
     } else if (boundPieces && (loAlong > 0.0) == (sample.along > 0.0) &&
-               !(std::fmax(loCurvature, hiCurvature) * 0.5 * (loDistance + sample.distance() + hi - lo) < 1.0)) {
+               !(sharpest * 0.5 * (loDistance + sample.distance() + hi - lo) < 1.0)) {
       return EFootScan::kDense;
     }
     lo = hi;
     loAlong = sample.along;
     loDistance = sample.distance();
-    loCurvature = hiCurvature;
   }
   foot = best;
   return EFootScan::kFound;

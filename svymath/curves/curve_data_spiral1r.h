@@ -73,7 +73,7 @@ class SVYMATH_API CCurveDataSpiral1R {
   // is returned (len 0 or the total length) when the nearest point is an end. False for undefined data.
   bool getShortestDistAndCurveLen(double north, double east, double& dist, double& len) const;
   // The nearest foot of a perpendicular from the local point, or the nearer end: the element is cut into
-  // pieces of at most a quarter turn, each foot bracketed by the along component changing sign between the
+  // pieces of at most half a radian of turn, each foot bracketed by the along component changing sign between the
   // ends of a piece (32 samples instead where a piece could hide one) and found by a Newton search on the
   // foot-point condition (bisection fallback) converging to tol::kProjectionLength. False for undefined
   // data or a non-finite point.
@@ -122,6 +122,8 @@ class SVYMATH_API CCurveDataSpiral1R {
   bool componentsAt(double north, double east, double s, double& along, double& offset) const;
   // The foot between a and b, where along(a) > 0 >= along(b): bracketed Newton with bisection fallback.
   bool refineFoot(double north, double east, double a, double b, double aAlong, double bAlong, TFoot& candidate) const;
+  // Curvature of the law's sharp end (1/m, unsigned): no part of the element is sharper.
+  double sharpestCurvature() const;
   // Number of projection pieces of the element (see findFoot); 0 when it needs more than the dense samples.
   int projectionPieces(double total) const;
   // How a scan of the element for the nearest foot or end ended.
