@@ -27,6 +27,7 @@ int main(int argc, char** argv) {
   registerResectVerbs(app);
   registerTraverseVerbs(app);
   registerViewVerbs(app);
+  registerAreaVerbs(app);
 
   try {
     app.parse(argc, argv);
