@@ -306,4 +306,39 @@ constexpr double kUndefinedArcRadius = 1e-6;
 
 }  // namespace tol
 
+// Alignments.
+namespace tol {
+
+// Two alignment elements are equal (isEqual) when their lengths and radii agree within this (metres) and
+// their fixed start azimuths within this (radians): far below survey precision, above the rounding of
+// values computed from the same input in a different order.
+constexpr double kElementEqual = 1e-9;
+// The batch point-to-chainage search grows each element's plan box by this (metres) in its spatial index:
+// an element accepts the foot of a point up to tol::kSnap beyond its ends, so an element whose box lies
+// farther than the margin minus that snap from the point cannot offer it a smaller offset.
+constexpr double kSearchIndexMargin = 2.0 * kSnap;
+// First search radius (metres) beyond the nearest element box: the radius then doubles until no element
+// outside it can change the answer.
+constexpr double kSearchStartRadius = 1.0;
+// Doublings of the search radius before the search falls back to all elements (2^64 m exceeds any plan).
+constexpr int kSearchRadiusDoublings = 64;
+
+}  // namespace tol
+
+// Vertical alignments (profiles).
+namespace units {
+
+// Grades are percent: a grade g rises g / kPercent metres per metre of chainage.
+constexpr double kPercent = 100.0;
+
+}  // namespace units
+
+namespace limits {
+
+// Regular stations one chainage iteration yields at most: a million (20 MB of points) covers 10 000 km at
+// 10 m; an absurd interval or range ends the stations there instead of exhausting memory.
+constexpr double kMaxChainageStations = 1.0e6;
+
+}  // namespace limits
+
 }  // namespace svy_math

@@ -23,8 +23,12 @@ int main(int argc, char** argv) {
   registerCurveVerbs(app);
   registerGeoVerbs(app);
   registerTimeVerbs(app);
+<<<<<<< HEAD
   registerLocalizeVerbs(app);
   registerResectVerbs(app);
+=======
+  registerProfileVerbs(app);
+>>>>>>> valign
 
   try {
     app.parse(argc, argv);

@@ -21,3 +21,5 @@ void registerTimeVerbs(CLI::App& app);
 void registerLocalizeVerbs(CLI::App& app);
 // "svy resect": free-station resection.
 void registerResectVerbs(CLI::App& app);
+// "svy profile": heights and grades of a profile given by its vertical intersection points.
+void registerProfileVerbs(CLI::App& app);

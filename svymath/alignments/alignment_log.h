@@ -1,0 +1,8 @@
+#pragma once
+// Source names under which the alignment code logs unexpected internal states.
+namespace svy_math {
+
+constexpr const char* kAlntElementsLogSource = "mathAlntElements";
+constexpr const char* kAlntsLogSource = "mathAlnts";
+
+}  // namespace svy_math
