@@ -23,12 +23,9 @@ int main(int argc, char** argv) {
   registerCurveVerbs(app);
   registerGeoVerbs(app);
   registerTimeVerbs(app);
-<<<<<<< HEAD
   registerLocalizeVerbs(app);
   registerResectVerbs(app);
-=======
   registerProfileVerbs(app);
->>>>>>> valign
 
   try {
     app.parse(argc, argv);
