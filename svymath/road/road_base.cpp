@@ -82,11 +82,13 @@ bool CRoadBase::getHtAtChainAndOffset(double chainage, double offset, double& he
     if (section->getElevationAtOffs(offset, height, &ratio)) {
       found = true;
     } else if (section->hasPoints()) {
-      // Beyond the section (or at its rightmost point, which has no segment to its right) the height of
-      // the nearer outermost point, level.
-      const CRoadCrossSectPoint* end = offset >= section->getRightMostPoint()->getOffset()  ? section->getRightMostPoint()
-                                       : offset < section->getLeftMostPoint()->getOffset() ? section->getLeftMostPoint()
-                                                                                            : nullptr;
+      // At or beyond the outermost points the nearer one's height, level. (At the rightmost point's offset
+      // there is no segment to its right, and at the leftmost one's the lookup passes it over.)
+      const CRoadCrossSectPoint* left = section->getLeftMostPoint();
+      const CRoadCrossSectPoint* right = section->getRightMostPoint();
+      const CRoadCrossSectPoint* end = offset >= right->getOffset() ? right
+                                       : offset <= left->getOffset() ? left
+                                                                     : nullptr;
       if (end != nullptr) {
         height = end->getElevation();
         ratio = 0.0;
@@ -134,13 +136,31 @@ bool CRoadBase::generateStringCache() {
                              [](double a, double b) { return b - a < svy_math::tol::kSnap; }),
                  stations.end());
 
+  // A string per point name and occurrence: the n-th point of a name from the left at every station (names
+  // repeat on the two sides of a section).
+  struct TStringKey {
+    svy_text::CSvyString name;
+    int occurrence;
+    int index;
+  };
+  svy_vector<TStringKey> keys;
   for (double c : stations) {
     CRoadCrossSection* section = nullptr;
     if (!getCrossSectionAtChainage(c, section, false)) continue;
     for (const CRoadCrossSectPoint* p = section->getLeftMostPoint(); p != nullptr; p = p->getRight()) {
-      CRoadString* line = m_stringCache.findString(p->getName());
-      if (line == nullptr) line = m_stringCache.getString(m_stringCache.addString(CRoadString(p->getName(), p->getFeatureIndex())));
-      line->addVertex(c, p->getOffset(), p->getElevation());
+      int occurrence = 0;
+      for (const CRoadCrossSectPoint* q = section->getLeftMostPoint(); q != p; q = q->getRight()) {
+        occurrence += q->getName() == p->getName() ? 1 : 0;
+      }
+      auto key = std::find_if(keys.begin(), keys.end(), [&](const TStringKey& k) {
+        return k.occurrence == occurrence && k.name == p->getName();
+      });
+      if (key == keys.end()) {
+        keys.push_back(TStringKey{p->getName(), occurrence,
+                                  m_stringCache.addString(CRoadString(p->getName(), p->getFeatureIndex()))});
+        key = keys.end() - 1;
+      }
+      m_stringCache.getString(key->index)->addVertex(c, p->getOffset(), p->getElevation());
     }
     delete section;
   }

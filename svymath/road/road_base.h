@@ -67,9 +67,9 @@ class SVYMATH_API CRoadBase : public CHorzAndVertAlntBase {
   virtual bool hasCorridorLeftOffset() const;
   virtual bool hasCorridorRightOffset() const;
   // The design height at a chainage and offset. With useCrossSection, from the section there: on its
-  // surface (slopePercent, if asked, gets the segment's slope in percent), or beyond its outermost points
-  // the nearer outermost point's elevation with slope 0 (also a success). Without useCrossSection, or when
-  // no section can be built there, the centre-line height, whatever the offset, with slope 0.
+  // surface (slopePercent, if asked, gets the segment's slope in percent), or at or beyond its outermost
+  // points the nearer outermost point's elevation with slope 0 (also a success). Without useCrossSection,
+  // or when no section can be built there, the centre-line height, whatever the offset, with slope 0.
   virtual bool getHtAtChainAndOffset(double chainage, double offset, double& height, bool useCrossSection,
                                      double* slopePercent = nullptr) const;
   // The plan position and the design height together; true only when both are found.
@@ -88,8 +88,9 @@ class SVYMATH_API CRoadBase : public CHorzAndVertAlntBase {
   virtual void clearCorridorRightOffset() = 0;
 
   // ---- strings generated from the surface ----
-  // Replaces the cache with one string per point name of the sections at the regular stations (the
-  // chainage interval from the start), at each template assignment and at the end, with absolute heights.
+  // Replaces the cache with one string per point of the sections (by name, the n-th of a name from the
+  // left) at the regular stations (the chainage interval from the start), at each template assignment and at
+  // the end, with absolute heights.
   // False (cache emptied) when the road has no surface definition or no length.
   bool generateStringCache();
   void clearStringSetCache() { m_stringCache.removeAll(); }

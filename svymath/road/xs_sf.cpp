@@ -7,6 +7,22 @@
 
 SVY_RTTI_DEFINE(CXsSf, CRttiBase)
 
+namespace {
+
+// The point of `other` matching point i of `from`: the same name, and as many points of that name before
+// it (names repeat on the two sides of a template, and are met in the same order).
+const TXsTemplatePoint* matchingPoint(const CCrossSectTemplate& from, int i, const CCrossSectTemplate& other) {
+  const svy_text::CSvyString& name = from.getPoint(i)->name;
+  int occurrence = 0;
+  for (int k = 0; k < i; ++k) occurrence += from.getPoint(k)->name == name ? 1 : 0;
+  for (int k = 0; k < other.getNumOfPoints(); ++k) {
+    if (other.getPoint(k)->name == name && occurrence-- == 0) return other.getPoint(k);
+  }
+  return nullptr;
+}
+
+}  // namespace
+
 CXsSf::CXsSf() = default;
 CXsSf::CXsSf(const CXsSf& other) : CRttiBase(), m_entries(other.m_entries) {}
 CXsSf& CXsSf::operator=(const CXsSf& other) {
@@ -69,7 +85,7 @@ bool CXsSf::forEachPointAt(double chainage, Sink&& sink) const {
   bool any = false;
   for (int i = 0; i < before->sectionTemplate.getNumOfPoints(); ++i) {
     const TXsTemplatePoint& p = *before->sectionTemplate.getPoint(i);
-    const TXsTemplatePoint* q = before == after ? &p : after->sectionTemplate.findPoint(p.name);
+    const TXsTemplatePoint* q = before == after ? &p : matchingPoint(before->sectionTemplate, i, after->sectionTemplate);
     if (q == nullptr) continue;
     sink(p.name, p.offset + t * (q->offset - p.offset), p.height + t * (q->height - p.height), p.featureIndex);
     any = true;

@@ -1,7 +1,8 @@
 #pragma once
 // A surface definition by templates: cross-section templates assigned to chainages (metres). Between two
 // consecutive assignments the section is interpolated linearly in chainage: points are matched by name
-// (the first point of that name in the later template), and their offsets and relative heights are
+// (the n-th point of a name from the left with the n-th of that name in the later template, as names
+// repeat on the two sides), and their offsets and relative heights are
 // interpolated; a point whose name the other template lacks is left out between the two assignments (it
 // stands only at its own template's chainage). Side slopes are interpolated when both templates have them,
 // else the earlier template's hold. Before the first assignment the first template holds, after the last the
