@@ -73,21 +73,17 @@ bool CRoadCrossSectionSlope::getHingePoint(double& offset, double& elevation) co
   return true;
 }
 
-bool CRoadCrossSectionSlope::getHingePointElevation(double& elevation) const {
-  const double z = m_explicitHinge ? m_hingeElevation
-                   : getDefaultHingePoint() != nullptr ? getDefaultHingePoint()->getElevation()
-                                                       : svy_math::undefinedValue();
-  if (std::isnan(z)) return false;
-  elevation = z;
-  return true;
-}
+bool CRoadCrossSectionSlope::getHingePointElevation(double& elevation) const { return hingeValue(true, elevation); }
 
-bool CRoadCrossSectionSlope::getHingePointOffset(double& offset) const {
-  const double o = m_explicitHinge ? m_hingeOffset
-                   : getDefaultHingePoint() != nullptr ? getDefaultHingePoint()->getOffset()
-                                                       : svy_math::undefinedValue();
-  if (std::isnan(o)) return false;
-  offset = o;
+bool CRoadCrossSectionSlope::getHingePointOffset(double& offset) const { return hingeValue(false, offset); }
+
+bool CRoadCrossSectionSlope::hingeValue(bool elevation, double& value) const {
+  const CRoadCrossSectPoint* point = m_explicitHinge ? nullptr : getDefaultHingePoint();
+  const double v = m_explicitHinge ? (elevation ? m_hingeElevation : m_hingeOffset)
+                   : point != nullptr ? (elevation ? point->getElevation() : point->getOffset())
+                                      : svy_math::undefinedValue();
+  if (std::isnan(v)) return false;
+  value = v;
   return true;
 }
 

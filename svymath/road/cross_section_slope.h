@@ -78,6 +78,8 @@ class SVYMATH_API CRoadCrossSectionSlope {
   double convertToClOffset(double local) const;
 
  private:
+  // The hinge's elevation or offset: the explicit hinge's, else the default hinge point's.
+  bool hingeValue(bool elevation, double& value) const;
   bool heightFromSlope(double offset, double runRise, double& height) const;
   bool catchOnSlope(double runRise, double groundElevation, double hingeElevation, double& offset,
                     double* runRiseOut) const;

@@ -6,7 +6,7 @@
 
 #include <cmath>
 #include <memory>
-#include <thread>
+#include <future>
 #include <vector>
 
 #include "alignments/alignment_test_support.h"
@@ -25,14 +25,14 @@ struct TRoad {
   CRoadBaseImpl road;
 
   explicit TRoad(double profileLength = 600.0) {
-    pair.setStartPos(alnt_test::kNorth0, alnt_test::kEast0, 300.0);
     pair.setStartChainageInM(1000.0);
-    EXPECT_TRUE(pair.appendElement(alnt_test::tangent(200.0, 30.0)));
-    EXPECT_TRUE(pair.appendElement(alnt_test::arc(100.0, 500.0, true)));
-    EXPECT_TRUE(pair.appendElement(alnt_test::tangent(200.0)));
-    CVerticalElement grade;
-    grade.setStraight(profileLength, 2.0);
-    EXPECT_TRUE(pair.appendElement(grade));
+    pair.setStartPos(alnt_test::kNorth0, alnt_test::kEast0, 300.0);
+    const CAlntHeSegment first = alnt_test::tangent(200.0, 30.0), last = alnt_test::tangent(200.0);
+    const CAlntHeArc curve = alnt_test::arc(100.0, 500.0, true);
+    for (const CAlntHe* element : std::initializer_list<const CAlntHe*>{&first, &curve, &last}) {
+      EXPECT_TRUE(pair.appendElement(*element));
+    }
+    EXPECT_TRUE(pair.appendElement(CVerticalElement(1000.0, 300.0, profileLength, 2.0)));
     CCrossSectTemplate t(L"rural");
     for (double side : {-1.0, 1.0}) {
       t.addPoint(L"EP", 4.0 * side, -0.1, 2);
@@ -190,25 +190,19 @@ TEST(Road, StringsAsSurfaceAndGeneratedStrings) {
 // Readers on several threads see what one reader sees (run under ThreadSanitizer in CI).
 TEST(RoadConcurrency, ParallelReadersAgree) {
   const TRoad r;
-  std::vector<double> expected;
-  for (double c = 1000.0; c <= 1500.0; c += 3.7) {
-    double h = 0.0;
-    r.road.getHtAtChainAndOffset(c, 2.5, h, true);
-    expected.push_back(h);
-  }
-  std::vector<int> mismatches(4, 0);
-  std::vector<std::thread> readers;
-  for (int t = 0; t < 4; ++t) {
-    readers.emplace_back([&, t] {
-      std::size_t i = 0;
-      for (double c = 1000.0; c <= 1500.0; c += 3.7, ++i) {
-        double h = 0.0;
-        if (!r.road.getHtAtChainAndOffset(c, 2.5, h, true) || h != expected[i]) ++mismatches[t];
-      }
-    });
-  }
-  for (std::thread& reader : readers) reader.join();
-  EXPECT_EQ(mismatches, std::vector<int>(4, 0));
+  const auto heights = [&r] {
+    std::vector<double> out;
+    for (double c = 1000.0; c <= 1500.0; c += 3.7) {
+      double h = NAN;
+      r.road.getHtAtChainAndOffset(c, 2.5, h, true);
+      out.push_back(h);
+    }
+    return out;
+  };
+  const std::vector<double> expected = heights();
+  std::vector<std::future<std::vector<double>>> readers;
+  for (int t = 0; t < 4; ++t) readers.push_back(std::async(std::launch::async, heights));
+  for (auto& reader : readers) EXPECT_EQ(reader.get(), expected);
 }
 
 }  // namespace
