@@ -26,6 +26,7 @@ int main(int argc, char** argv) {
   registerLocalizeVerbs(app);
   registerResectVerbs(app);
   registerProfileVerbs(app);
+  registerRoadVerbs(app);
 
   try {
     app.parse(argc, argv);

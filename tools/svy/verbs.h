@@ -23,3 +23,5 @@ void registerLocalizeVerbs(CLI::App& app);
 void registerResectVerbs(CLI::App& app);
 // "svy profile": heights and grades of a profile given by its vertical intersection points.
 void registerProfileVerbs(CLI::App& app);
+// "svy road": catch points of cut and fill slopes (slope staking).
+void registerRoadVerbs(CLI::App& app);
