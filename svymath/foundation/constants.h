@@ -118,6 +118,10 @@ constexpr double kOutlierFactor = 3.0;
 // N 10 000 000 are 2e-9 m apart and a fit over a few of them loses a few hundred such steps.
 constexpr double kResidualZero = 1e-6;
 
+// Two bearings whose unit directions have a cross product (the sine of the angle between them) strictly
+// within +-1e-12 are parallel: their crossing would lie more than 1e12 times the points' separation away.
+constexpr double kParallelSine = 1e-12;
+
 }  // namespace tol
 
 namespace units {

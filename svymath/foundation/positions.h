@@ -5,6 +5,7 @@
 // up on the map), component 1 is E (grid east, right). Azimuths are radians clockwise from north,
 // azimuth = atan2(dE, dN); the unit direction of azimuth a is (N = cos a, E = sin a). Offsets are positive
 // to the right of the direction of travel.
+#include <cmath>
 #include <type_traits>
 
 #include "svymath/foundation/abstract_point.h"
@@ -27,6 +28,8 @@ class C2dPos : public svy_math::TAbstractPoint2<double> {
   double north() const { return m_comp[0]; }
   double& east() { return m_comp[1]; }
   double east() const { return m_comp[1]; }
+  // Whether northing and easting are both finite numbers.
+  bool isFinite() const { return std::isfinite(m_comp[0]) && std::isfinite(m_comp[1]); }
 };
 
 static_assert(sizeof(C2dPos) == 2 * sizeof(double), "a position is two doubles");

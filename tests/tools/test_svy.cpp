@@ -105,6 +105,8 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
       {"profile height --pvi 0,100 --pvi 50", "CH,H[,L]"},
       {"profile height --pvi 0,100 --pvi 100,101,150 --pvi 150,100", "must not overlap"},
       {"road catch", "--cut, --fill"}, {"road catch --cut -2", "--cut"},
+      {"cogo intersect --mode xy", "--mode"}, {"traverse adjust", "--start"}, {"traverse adjust --start 1", "--start"},
+      {"traverse adjust --start 0,0 --rule simple", "--rule"},
   };
   for (const auto& [args, message] : cases) {
     SCOPED_TRACE(args);
@@ -117,7 +119,8 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
   }
   const SvyResult help = runSvy({"--help"});
   EXPECT_EQ(help.exitStatus, 0);
-  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "profile", "road"}) {
+  for (const char* family :
+       {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "traverse", "profile", "road"}) {
     EXPECT_NE(help.out.find(family), std::string::npos) << family;
   }
 }

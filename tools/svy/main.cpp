@@ -27,6 +27,7 @@ int main(int argc, char** argv) {
   registerResectVerbs(app);
   registerProfileVerbs(app);
   registerRoadVerbs(app);
+  registerTraverseVerbs(app);
 
   try {
     app.parse(argc, argv);

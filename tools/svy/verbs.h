@@ -25,3 +25,5 @@ void registerResectVerbs(CLI::App& app);
 void registerProfileVerbs(CLI::App& app);
 // "svy road": catch points of cut and fill slopes (slope staking).
 void registerRoadVerbs(CLI::App& app);
+// "svy traverse": adjustment of a traverse between known points (compass and transit rules).
+void registerTraverseVerbs(CLI::App& app);
