@@ -37,7 +37,8 @@ void buildPair(CHorzAndVertAlnt& pair) {
     pair.appendElement(CAlntHeSpiral(CCurveSpiral(0.0, 0.0, CMathAngle(0.0), exit)));
   }
   pair.onBulkUpdateFinished();
-  for (int i = 0; i < 10; ++i) pair.appendElement(CVerticalElement(12000.0 + 300.0 * i, 0.0, 300.0, i % 2 == 0 ? 1.5 : -1.0));
+  for (int i = 0; i < 10; ++i)
+    pair.appendElement(CVerticalElement(12000.0 + 300.0 * i, 0.0, 300.0, i % 2 == 0 ? 1.5 : -1.0));
 }
 
 CCrossSectTemplate benchTemplate(double lane) {

@@ -17,11 +17,11 @@ struct TXsGroundPoint {
 // How the search for a catch point ended.
 enum ECatchPointStatus {
   eCatchPointFound = 0,
-  eCatchPointNoHinge,    // the slope has no hinge point
-  eCatchPointNoSlope,    // no slope of the side suits the ground at the hinge
-  eCatchPointNoGround,   // fewer than two ground points, points out of offset order or not numbers, or the
-                         // ground does not reach the hinge's offset
-  eCatchPointNotMet      // the chosen slope runs outward without meeting the ground
+  eCatchPointNoHinge,   // the slope has no hinge point
+  eCatchPointNoSlope,   // no slope of the side suits the ground at the hinge
+  eCatchPointNoGround,  // fewer than two ground points, points out of offset order or not numbers, or the
+                        // ground does not reach the hinge's offset
+  eCatchPointNotMet     // the chosen slope runs outward without meeting the ground
 };
 
 // The end of a slope after a horizontal run outward from the hinge (metres, not negative): its offset from

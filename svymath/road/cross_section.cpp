@@ -153,8 +153,8 @@ void CRoadCrossSection::adopt(CRoadCrossSectPoint& point, CRoadCrossSectPoint* l
   point.m_section = this;
   point.m_left = left;
   point.m_right = right;
-  if (left != nullptr) left->m_right = &point; else m_leftMost = &point;
-  if (right != nullptr) right->m_left = &point; else m_rightMost = &point;
+  (left != nullptr ? left->m_right : m_leftMost) = &point;
+  (right != nullptr ? right->m_left : m_rightMost) = &point;
   ++m_cacheVersion;
 }
 
@@ -184,8 +184,8 @@ void CRoadCrossSection::deleteAllPoints() {
 }
 
 void CRoadCrossSection::onPointDetaching(CRoadCrossSectPoint& point) {
-  if (point.m_left != nullptr) point.m_left->m_right = point.m_right; else m_leftMost = point.m_right;
-  if (point.m_right != nullptr) point.m_right->m_left = point.m_left; else m_rightMost = point.m_left;
+  (point.m_left != nullptr ? point.m_left->m_right : m_leftMost) = point.m_right;
+  (point.m_right != nullptr ? point.m_right->m_left : m_rightMost) = point.m_left;
   point.m_section = nullptr;
   point.m_left = nullptr;
   point.m_right = nullptr;

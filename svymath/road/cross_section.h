@@ -38,8 +38,7 @@ class SVYMATH_API CRoadCrossSection : public virtual CRttiBase {
   // The first point (from the left) with a feature index; null when none has it.
   virtual const CRoadCrossSectPoint* findPointWithId(unsigned featureIndex) const;
   // Of the points with a name, the one nearest to an offset; null when none has the name.
-  virtual const CRoadCrossSectPoint* findPointFromNameAndOffs(const svy_text::CSvyString& name,
-                                                              double offset) const;
+  virtual const CRoadCrossSectPoint* findPointFromNameAndOffs(const svy_text::CSvyString& name, double offset) const;
   // The point at a 0-based index from the left; null outside the chain.
   virtual const CRoadCrossSectPoint* getPointAtIndex(int index) const;
   // The point on the centre line (offset within tol::kOffsetZero of 0); null when there is none.

@@ -79,7 +79,7 @@ bool CRoadCrossSectionSlope::getHingePointOffset(double& offset) const { return 
 
 bool CRoadCrossSectionSlope::hingeValue(bool elevation, double& value) const {
   const CRoadCrossSectPoint* point = m_explicitHinge ? nullptr : getDefaultHingePoint();
-  const double v = m_explicitHinge ? (elevation ? m_hingeElevation : m_hingeOffset)
+  const double v = m_explicitHinge    ? (elevation ? m_hingeElevation : m_hingeOffset)
                    : point != nullptr ? (elevation ? point->getElevation() : point->getOffset())
                                       : svy_math::undefinedValue();
   if (std::isnan(v)) return false;
@@ -123,7 +123,8 @@ bool CRoadCrossSectionSlope::getCatchPointOffset(double groundElevation, double&
   const bool steepCut = hasCut() && !isZero(m_cutRunRise);
   const bool steepFill = hasFill() && !isZero(m_fillRunRise);
   // The cut slope first; when it is not taken or does not reach the ground outward, the fill slope.
-  if (steepCut && !(groundElevation < hinge && steepFill) && catchOnSlope(m_cutRunRise, groundElevation, hinge, offset, runRise)) {
+  if (steepCut && !(groundElevation < hinge && steepFill) &&
+      catchOnSlope(m_cutRunRise, groundElevation, hinge, offset, runRise)) {
     return true;
   }
   if (steepFill && (groundElevation < hinge || !hasCut() || isZero(m_cutRunRise))) {
@@ -132,8 +133,8 @@ bool CRoadCrossSectionSlope::getCatchPointOffset(double groundElevation, double&
   return false;
 }
 
-bool CRoadCrossSectionSlope::catchOnSlope(double runRise, double groundElevation, double hingeElevation,
-                                          double& offset, double* runRiseOut) const {
+bool CRoadCrossSectionSlope::catchOnSlope(double runRise, double groundElevation, double hingeElevation, double& offset,
+                                          double* runRiseOut) const {
   const double catchOffset = convertToClOffset(runRise * (groundElevation - hingeElevation));
   if (!isOffsetAtSlope(catchOffset)) return false;
   offset = catchOffset;

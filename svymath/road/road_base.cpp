@@ -4,6 +4,8 @@
 #include <cmath>
 
 #include "svymath/foundation/constants.h"
+#include "svymath/road/road_log.h"
+#include "svyutils/svy_err_log.h"
 
 SVY_RTTI_DEFINE(CRoadBase, CHorzAndVertAlntBase)
 
@@ -43,8 +45,7 @@ bool CRoadBase::getPosNeAtChainAndOffsetExtr(double chainage, double offset, dou
 bool CRoadBase::getAzimuthAtChainExtr(double chainage, double& azimuthDeg) const {
   return getHorzAlnt().getAzimuthAtChainExtr(chainage, azimuthDeg);
 }
-const CHorzAlntElemBase* CRoadBase::getHorzElemAtChain(double chainage, double* distanceInElement,
-                                                       int* index) const {
+const CHorzAlntElemBase* CRoadBase::getHorzElemAtChain(double chainage, double* distanceInElement, int* index) const {
   return getHorzAlnt().getHorzElemAtChain(chainage, distanceInElement, index);
 }
 bool CRoadBase::getPosAtChainAndOffset(double chainage, double offset, double& north, double& east) const {
@@ -86,7 +87,7 @@ bool CRoadBase::getHtAtChainAndOffset(double chainage, double offset, double& he
       // there is no segment to its right, and at the leftmost one's the lookup passes it over.)
       const CRoadCrossSectPoint* left = section->getLeftMostPoint();
       const CRoadCrossSectPoint* right = section->getRightMostPoint();
-      const CRoadCrossSectPoint* end = offset >= right->getOffset() ? right
+      const CRoadCrossSectPoint* end = offset >= right->getOffset()  ? right
                                        : offset <= left->getOffset() ? left
                                                                      : nullptr;
       if (end != nullptr) {
@@ -132,9 +133,9 @@ bool CRoadBase::generateStringCache() {
   }
   stations.push_back(end);
   std::sort(stations.begin(), stations.end());
-  stations.erase(std::unique(stations.begin(), stations.end(),
-                             [](double a, double b) { return b - a < svy_math::tol::kSnap; }),
-                 stations.end());
+  stations.erase(
+      std::unique(stations.begin(), stations.end(), [](double a, double b) { return b - a < svy_math::tol::kSnap; }),
+      stations.end());
 
   // A string per point name and occurrence: the n-th point of a name from the left at every station (names
   // repeat on the two sides of a section).
@@ -160,7 +161,10 @@ bool CRoadBase::generateStringCache() {
                                   m_stringCache.addString(CRoadString(p->getName(), p->getFeatureIndex()))});
         key = keys.end() - 1;
       }
-      m_stringCache.getString(key->index)->addVertex(c, p->getOffset(), p->getElevation());
+      // The stations increase, so a refused vertex means a section point that is not a number.
+      if (!m_stringCache.getString(key->index)->addVertex(c, p->getOffset(), p->getElevation())) {
+        svy_logging::svy_err_log(svy_math::kRoadTemplLogSource, __LINE__, "");
+      }
     }
     delete section;
   }

@@ -3,6 +3,8 @@
 #include <cmath>
 
 #include "svymath/foundation/constants.h"
+#include "svymath/road/road_log.h"
+#include "svyutils/svy_err_log.h"
 
 SVY_RTTI_DEFINE2(CRoadBaseImpl, CRoadBase, CAlntBaseImpl)
 
@@ -87,8 +89,10 @@ bool CRoadBaseImpl::getCrossSectionAtChainage(double chainage, CRoadCrossSection
   double east = 0.0;
   double azimuthDeg = 0.0;
   bool planExtrapolated = false;
-  if (!getHorzAlnt().getPosNeAtChainExtr(chainage, north, east, planExtrapolated) ||
-      !getHorzAlnt().getAzimuthAtChainExtr(chainage, azimuthDeg)) {
+  if (!getHorzAlnt().getPosNeAtChainExtr(chainage, north, east, planExtrapolated)) return false;
+  if (!getHorzAlnt().getAzimuthAtChainExtr(chainage, azimuthDeg)) {
+    // An alignment that places a chainage but gives no direction there is inconsistent.
+    svy_logging::svy_err_log(svy_math::kRoadTemplLogSource, __LINE__, "");
     return false;
   }
   double height = 0.0;

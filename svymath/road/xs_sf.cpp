@@ -55,8 +55,7 @@ double CXsSf::getAssignmentChainage(int index) const {
 }
 
 const CCrossSectTemplate* CXsSf::getTemplate(int index) const {
-  return index >= 0 && index < getNumOfAssignments() ? &m_entries[static_cast<size_t>(index)].sectionTemplate
-                                                     : nullptr;
+  return index >= 0 && index < getNumOfAssignments() ? &m_entries[static_cast<size_t>(index)].sectionTemplate : nullptr;
 }
 
 bool CXsSf::bracket(double chainage, const TEntry*& before, const TEntry*& after, double& t) const {
@@ -85,7 +84,8 @@ bool CXsSf::forEachPointAt(double chainage, Sink&& sink) const {
   bool any = false;
   for (int i = 0; i < before->sectionTemplate.getNumOfPoints(); ++i) {
     const TXsTemplatePoint& p = *before->sectionTemplate.getPoint(i);
-    const TXsTemplatePoint* q = before == after ? &p : matchingPoint(before->sectionTemplate, i, after->sectionTemplate);
+    const TXsTemplatePoint* q =
+        before == after ? &p : matchingPoint(before->sectionTemplate, i, after->sectionTemplate);
     if (q == nullptr) continue;
     sink(p.name, p.offset + t * (q->offset - p.offset), p.height + t * (q->height - p.height), p.featureIndex);
     any = true;
@@ -112,8 +112,9 @@ bool CXsSf::getTemplateAtChainage(double chainage, CCrossSectTemplate& result) c
 
 bool CXsSf::fillSection(double chainage, double clElevation, CEditableRoadCrossSection& section) const {
   if (!std::isfinite(clElevation)) return false;
-  return forEachPointAt(chainage, [&](const svy_text::CSvyString& name, double offset, double height,
-                                      unsigned index) { section.addPoint(offset, clElevation + height, name, index); });
+  return forEachPointAt(chainage, [&](const svy_text::CSvyString& name, double offset, double height, unsigned index) {
+    section.addPoint(offset, clElevation + height, name, index);
+  });
 }
 
 bool CXsSf::getSideSlopesAtChainage(double chainage, bool rightSide, double& cutRunRise, double& fillRunRise) const {

@@ -15,7 +15,8 @@ std::unique_ptr<CEditableRoadCrossSection> crowned() {
   const struct {
     double offset, elevation;
     const char* name;
-  } points[] = {{3.5, 99.93, "LL"}, {-10.0, 99.5, "EDGE"}, {0.0, 100.0, "CL"}, {10.0, 99.5, "EDGE"}, {-3.5, 99.93, "LL"}};
+  } points[] = {
+      {3.5, 99.93, "LL"}, {-10.0, 99.5, "EDGE"}, {0.0, 100.0, "CL"}, {10.0, 99.5, "EDGE"}, {-3.5, 99.93, "LL"}};
   unsigned id = 1;
   for (const auto& p : points) EXPECT_TRUE(section->addPoint(p.offset, p.elevation, p.name, id++));
   return section;
@@ -32,7 +33,7 @@ TEST(CrossSection, PointLookupByOffset) {
   const struct {
     double offset, left, right;
   } cases[] = {{-12.0, NAN, -10.0}, {-10.0, NAN, -10.0}, {-3.5, -10.0, -3.5}, {-1.0, -3.5, 0.0},
-               {0.0, 0.0, 0.0},     {3.5, 3.5, 10.0},     {10.0, 10.0, NAN},  {12.0, 10.0, NAN}};
+               {0.0, 0.0, 0.0},     {3.5, 3.5, 10.0},    {10.0, 10.0, NAN},   {12.0, 10.0, NAN}};
   for (const auto& c : cases) {
     const double left = offsetOf(section->getLeftOfOffset(c.offset));
     const double right = offsetOf(section->getRightOfOffset(c.offset));
@@ -54,8 +55,11 @@ TEST(CrossSection, HeightsAndSlopeRatiosOnTheChain) {
   // Hand-computed: linear between the neighbours, rise over run of the segment holding the offset.
   const struct {
     double offset, elevation, ratio;
-  } cases[] = {{-10.0 + 3.25, 99.715, 0.43 / 6.5}, {-2.0, 99.96, 0.02}, {0.0, 100.0, -0.02},
-               {1.75, 99.965, -0.02},            {9.0, 99.5 + 0.43 / 6.5, -0.43 / 6.5}};
+  } cases[] = {{-10.0 + 3.25, 99.715, 0.43 / 6.5},
+               {-2.0, 99.96, 0.02},
+               {0.0, 100.0, -0.02},
+               {1.75, 99.965, -0.02},
+               {9.0, 99.5 + 0.43 / 6.5, -0.43 / 6.5}};
   for (const auto& c : cases) {
     double z = 0.0, ratio = 0.0;
     ASSERT_TRUE(section->getElevationAtOffs(c.offset, z, &ratio)) << c.offset;
@@ -79,8 +83,8 @@ TEST(CrossSection, SlopeRatioOfPointPairs) {
   CRoadCrossSectOffsPoint a(2.0, 10.0);
   const struct {
     double offset, elevation, ratio;
-  } cases[] = {{4.0, 10.5, 0.25}, {0.0, 10.5, -0.25}, {2.0, 11.0, 1.0e6}, {2.0, 9.0, -1.0e6}, {7.0, 10.0, 0.0},
-               {2.0, 10.0 + 1e-13, 0.0}};
+  } cases[] = {{4.0, 10.5, 0.25},  {0.0, 10.5, -0.25}, {2.0, 11.0, 1.0e6},
+               {2.0, 9.0, -1.0e6}, {7.0, 10.0, 0.0},   {2.0, 10.0 + 1e-13, 0.0}};
   for (const auto& c : cases) {
     CRoadCrossSectOffsPoint b(c.offset, c.elevation);
     EXPECT_DOUBLE_EQ(a.getSlopeRatio(b), c.ratio) << c.offset << " " << c.elevation;
@@ -97,7 +101,8 @@ TEST(CrossSection, PlanPositionsAcrossTheCentreLine) {
   const double n0 = 5000000.0, e0 = 500000.0;
   const struct {
     double azimuth, offset, dn, de;
-  } cases[] = {{0.0, 10.0, 0.0, 10.0}, {90.0, 10.0, -10.0, 0.0}, {90.0, -3.5, 3.5, 0.0}, {210.0, 2.0, 1.0, -std::sqrt(3.0)}};
+  } cases[] = {
+      {0.0, 10.0, 0.0, 10.0}, {90.0, 10.0, -10.0, 0.0}, {90.0, -3.5, 3.5, 0.0}, {210.0, 2.0, 1.0, -std::sqrt(3.0)}};
   for (const auto& c : cases) {
     section->setCenterLinePos(C2dPos(n0, e0), false);
     section->setCenterLineAzimuth(CMathAngle(c.azimuth));

@@ -5,8 +5,8 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
-#include <memory>
 #include <future>
+#include <memory>
 #include <vector>
 
 #include "alignments/alignment_test_support.h"
@@ -52,7 +52,7 @@ TEST(Road, PositionsAndHeightsAtChainageAndOffset) {
   const TRoad r;
   const struct {
     double chainage, offset, relHeight, slopePercent;
-  } cases[] = {{1000.0, 0.0, 0.0, -2.5},  {1100.0, -2.0, -0.05, 2.5}, {1250.0, 3.0, -0.075, -2.5},
+  } cases[] = {{1000.0, 0.0, 0.0, -2.5},   {1100.0, -2.0, -0.05, 2.5}, {1250.0, 3.0, -0.075, -2.5},
                {1350.0, 5.0, -0.14, -4.0}, {1499.0, -5.5, -0.16, 4.0}, {1200.0, 9.0, -0.18, 0.0},
                {1200.0, 6.0, -0.18, 0.0},  {1200.0, -6.0, -0.18, 0.0}, {1200.0, -30.0, -0.18, 0.0}};
   for (const auto& c : cases) {
@@ -83,8 +83,8 @@ TEST(Road, SectionsCarryTheCentreLine) {
   const struct {
     double chainage;
     bool planExtrapolated, heightExtrapolated;
-  } cases[] = {{1000.0, false, false}, {1270.0, false, false}, {1550.0, true, false}, {1650.0, true, true},
-               {990.0, true, true}};
+  } cases[] = {
+      {1000.0, false, false}, {1270.0, false, false}, {1550.0, true, false}, {1650.0, true, true}, {990.0, true, true}};
   for (const auto& c : cases) {
     CRoadCrossSection* raw = nullptr;
     const bool inside = !c.planExtrapolated && !c.heightExtrapolated;

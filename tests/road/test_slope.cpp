@@ -45,7 +45,7 @@ TEST(SideSlope, HingeAndOffsetsAtTheSlope) {
     bool right;
     double offset;
     bool atSlope;
-  } cases[] = {{true, 10.0, true},   {true, 9.9995, true},  {true, 9.99, false}, {true, 25.0, true},
+  } cases[] = {{true, 10.0, true},     {true, 9.9995, true}, {true, 9.99, false},  {true, 25.0, true},
                {false, -9.9995, true}, {false, -9.0, false}, {false, -30.0, true}, {false, 10.0, false}};
   for (const auto& c : cases) {
     CRoadCrossSectionSlope slope(s.section, c.right, 2.0, NAN);
@@ -199,9 +199,12 @@ TEST(CatchPoint, EndOfASlopeAfterARun) {
   const CRoadCrossSectionSlope right(s.section, true);
   const CRoadCrossSectionSlope left(s.section, false);
   double offset = 0.0, elevation = 0.0;
-  EXPECT_TRUE(ComputeXYOffsetsForCutFillSlope(right, 2.0, 6.0, offset, elevation) && offset == 16.0 && elevation == 103.0);
-  EXPECT_TRUE(ComputeXYOffsetsForCutFillSlope(left, -4.0, 6.0, offset, elevation) && offset == -16.0 && elevation == 98.5);
-  EXPECT_TRUE(ComputeXYOffsetsForCutFillSlope(left, 0.0, 6.0, offset, elevation) && offset == -16.0 && elevation == 100.0);
+  EXPECT_TRUE(ComputeXYOffsetsForCutFillSlope(right, 2.0, 6.0, offset, elevation) && offset == 16.0 &&
+              elevation == 103.0);
+  EXPECT_TRUE(ComputeXYOffsetsForCutFillSlope(left, -4.0, 6.0, offset, elevation) && offset == -16.0 &&
+              elevation == 98.5);
+  EXPECT_TRUE(ComputeXYOffsetsForCutFillSlope(left, 0.0, 6.0, offset, elevation) && offset == -16.0 &&
+              elevation == 100.0);
   EXPECT_FALSE(ComputeXYOffsetsForCutFillSlope(right, 2.0, -1.0, offset, elevation));
   EXPECT_FALSE(ComputeXYOffsetsForCutFillSlope(right, NAN, 1.0, offset, elevation));
 }

@@ -3,18 +3,16 @@
 // cross grade --ground-grade (percent, rising to the right; level by default). The cut slope --cut and the
 // fill slope --fill are given as horizontal run per unit of rise (2 for 2:1); the slope the ground at the
 // hinge calls for runs outward, away from the centre line, to the catch point.
-#include "row_io.h"
-#include "verbs.h"
-
-#include "svymath/foundation/constants.h"
-#include "svymath/road/catch_point.h"
-
 #include <CLI/CLI.hpp>
-
 #include <cmath>
 #include <memory>
 #include <string>
 #include <vector>
+
+#include "row_io.h"
+#include "svymath/foundation/constants.h"
+#include "svymath/road/catch_point.h"
+#include "verbs.h"
 
 namespace {
 
@@ -40,11 +38,13 @@ std::string reasonFor(ECatchPointStatus status) {
 }
 
 void addCatch(CLI::App& family) {
-  CLI::App* verb = family.add_subcommand("catch", "Catch points of cut and fill slopes from rows of hinge and ground shot");
+  CLI::App* verb =
+      family.add_subcommand("catch", "Catch points of cut and fill slopes from rows of hinge and ground shot");
   const std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
   const std::shared_ptr<TSlopeOptions> options = std::make_shared<TSlopeOptions>();
   verb->add_option("--cut", options->cutRun, "Cut slope as run per unit rise (2 for 2:1)")->check(CLI::PositiveNumber);
-  verb->add_option("--fill", options->fillRun, "Fill slope as run per unit fall (3 for 3:1)")->check(CLI::PositiveNumber);
+  verb->add_option("--fill", options->fillRun, "Fill slope as run per unit fall (3 for 3:1)")
+      ->check(CLI::PositiveNumber);
   verb->add_option("--ground-grade", options->groundGradePct, "Cross grade of the ground, percent rising to the right");
   verb->callback([verb, input, options] {
     if (std::isnan(options->cutRun) && std::isnan(options->fillRun)) {
