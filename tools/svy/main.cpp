@@ -28,6 +28,8 @@ int main(int argc, char** argv) {
   registerProfileVerbs(app);
   registerRoadVerbs(app);
   registerTraverseVerbs(app);
+  registerViewVerbs(app);
+  registerAreaVerbs(app);
 
   try {
     app.parse(argc, argv);

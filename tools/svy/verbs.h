@@ -27,3 +27,7 @@ void registerProfileVerbs(CLI::App& app);
 void registerRoadVerbs(CLI::App& app);
 // "svy traverse": adjustment of a traverse between known points (compass and transit rules).
 void registerTraverseVerbs(CLI::App& app);
+// "svy view": screen positions of targets seen from an observer.
+void registerViewVerbs(CLI::App& app);
+// "svy area": area and perimeter of a boundary of lines and arcs, and its subdivision by a known area.
+void registerAreaVerbs(CLI::App& app);
