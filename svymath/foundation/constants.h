@@ -373,6 +373,17 @@ constexpr double kMaxChainageStations = 1.0e6;
 
 }  // namespace svy_math
 
+// Road cross-sections and slopes.
+namespace svy_math {
+namespace tol {
+
+// Rise over run reported between two section points at the same offset (a vertical face such as a kerb
+// face given by two points): a finite stand-in for an infinite slope, signed by the rise.
+constexpr double kVerticalSlopeRatio = 1.0e6;
+
+}  // namespace tol
+}  // namespace svy_math
+
 // Areas bounded by lines and arcs, and their subdivision by a known area.
 namespace svy_math {
 namespace tol {

@@ -23,9 +23,10 @@ int main(int argc, char** argv) {
   registerCurveVerbs(app);
   registerGeoVerbs(app);
   registerTimeVerbs(app);
-  registerProfileVerbs(app);
   registerLocalizeVerbs(app);
   registerResectVerbs(app);
+  registerProfileVerbs(app);
+  registerRoadVerbs(app);
   registerTraverseVerbs(app);
   registerViewVerbs(app);
   registerAreaVerbs(app);
