@@ -73,10 +73,12 @@ bool parseCalendarTime(const std::string& text, CalendarTime& t, std::string& er
                        readDigits(text, 14, 2, t.minute) && text[16] == ':' && readDigits(text, 17, 2, wholeSecond);
   int fraction = 0;
   const std::size_t fractionDigits = text.size() > 20 ? text.size() - 20 : 0;
-  const bool fractionOk = text.size() == 19 || (text[19] == '.' && fractionDigits >= 1 &&
-                                                fractionDigits <= kMaxFractionDigits &&
-                                                readDigits(text, 20, fractionDigits, fraction));
-  if (!shapeOk || !fractionOk) {
+  // Only a text of the full shape has a character 19 to look at.
+  const bool fractionOk =
+      shapeOk && (text.size() == 19 || (text[19] == '.' && fractionDigits >= 1 &&
+                                        fractionDigits <= kMaxFractionDigits &&
+                                        readDigits(text, 20, fractionDigits, fraction)));
+  if (!fractionOk) {
     error = "expected a time YYYY-MM-DDThh:mm:ss[.fff], got '" + text + "'";
     return false;
   }
