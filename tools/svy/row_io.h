@@ -1,7 +1,8 @@
 #pragma once
 // Row input and output shared by every svy verb.
 //
-// Input: CSV rows from a file, or from stdin when the path is empty or "-". Blank lines and lines whose first
+// Input: CSV rows from a file, or from stdin when the path is empty or "-". A UTF-8 byte-order mark at the
+// start is skipped, and so is the carriage return of CRLF line ends. Blank lines and lines whose first
 // non-blank character is '#' are skipped; fields are trimmed; double-quoted fields may hold commas ("" is a
 // quote). The first content line is taken as a header and skipped when its fields equal the verb's input
 // column names (any case), or, for numeric input, when every field starts with a letter (a line of names). Line numbers count
@@ -141,7 +142,10 @@ class RowWriter {
   bool finished_ = false;
 };
 
-// Reports a bad row on stderr: "svy: line 7: <message>".
+// Input text for a message, in single quotes and cut to a few dozen bytes ("'1111111...'").
+std::string quoteForMessage(const std::string& text);
+
+// Reports a bad row on stderr: "svy: line 7: <message>", control bytes shown as \xNN.
 void reportBadRow(std::size_t lineNumber, const std::string& message);
 
 // The shape of a row-by-row verb: input column names (for the header and the messages), how many of them a
