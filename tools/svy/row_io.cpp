@@ -46,7 +46,8 @@ bool equalNoCase(const std::string& a, const std::string& b) {
 }
 
 // Splits one CSV line: commas separate fields, double quotes protect commas, "" inside quotes is a quote.
-std::vector<std::string> splitCsv(const std::string& line) {
+// Sets unclosed when the line ends inside quotes.
+std::vector<std::string> splitCsv(const std::string& line, bool& unclosed) {
   std::vector<std::string> fields;
   std::string field;
   bool quoted = false;
@@ -75,6 +76,7 @@ std::vector<std::string> splitCsv(const std::string& line) {
     }
   }
   fields.push_back(wasQuoted ? field : trim(field));
+  unclosed = quoted;
   return fields;
 }
 
@@ -158,6 +160,15 @@ OutputOptions outputOptionsFor(const CLI::App& command) {
   return options;
 }
 
+CLI::Option* requireNumberText(CLI::Option* option) {
+  return option->check(CLI::Validator(
+      [](const std::string& text) {
+        double value = 0.0;
+        return parseNumber(text, value) ? std::string() : "expected a number, got " + quoteForMessage(text);
+      },
+      "NUMBER"));
+}
+
 std::shared_ptr<std::string> addInputArgument(CLI::App& verb) {
   auto path = std::make_shared<std::string>();
   verb.add_option("file", *path, "CSV input file (default: standard input)");
@@ -189,12 +200,14 @@ bool RowReader::next(InputRow& row) {
     ++lineNumber_;
     if (lineNumber_ == 1 && line.rfind(kUtf8ByteOrderMark, 0) == 0) line.erase(0, sizeof kUtf8ByteOrderMark - 1);
     if (!isContentLine(line)) continue;
-    std::vector<std::string> fields = splitCsv(line);
+    bool unclosedQuote = false;
+    std::vector<std::string> fields = splitCsv(line, unclosedQuote);
     const bool first = !seenContent_;
     seenContent_ = true;
     if (first && isHeader(fields)) continue;
     row.lineNumber = lineNumber_;
     row.fields = std::move(fields);
+    row.unclosedQuote = unclosedQuote;
     row.numbers.clear();
     return true;
   }
@@ -299,6 +312,10 @@ void reportBadRow(std::size_t lineNumber, const std::string& message) {
 }
 
 bool checkRow(const RowFormat& format, InputRow& row, std::string& error) {
+  if (row.unclosedQuote) {
+    error = "a double quote is not closed";
+    return false;
+  }
   if (!fieldCountFits(format, row.fields.size())) {
     error = fieldCountMessage(format, row.fields.size());
     return false;
@@ -316,9 +333,10 @@ bool checkRow(const RowFormat& format, InputRow& row, std::string& error) {
 }
 
 bool parseNumberList(const std::string& text, std::size_t count, std::vector<double>& values) {
-  const std::vector<std::string> fields = splitCsv(text);
+  bool unclosedQuote = false;
+  const std::vector<std::string> fields = splitCsv(text, unclosedQuote);
   std::vector<double> parsed(fields.size());
-  if (fields.size() != count) return false;
+  if (fields.size() != count || unclosedQuote) return false;
   for (std::size_t i = 0; i < fields.size(); ++i) {
     if (!parseNumber(fields[i], parsed[i])) return false;
   }

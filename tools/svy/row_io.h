@@ -43,6 +43,7 @@
 
 namespace CLI {
 class App;
+class Option;
 }
 
 namespace svy_tool {
@@ -60,6 +61,10 @@ struct OutputOptions {
 
 // Reads the global options from the root of the command a verb belongs to.
 OutputOptions outputOptionsFor(const CLI::App& command);
+
+// Makes a number option read its text as rows are read (parseNumber): "nan", "inf", hexadecimal and values
+// beyond the range of double are refused with "--radius: expected a number, got 'nan'". Returns the option.
+CLI::Option* requireNumberText(CLI::Option* option);
 
 // Adds the optional positional input file to a verb ("-" or nothing: stdin) and returns where its value goes;
 // the verb's callback keeps the returned pointer (and so the string) alive by capturing it.
@@ -82,6 +87,7 @@ using Cell = std::variant<double, std::string>;
 struct InputRow {
   std::size_t lineNumber = 0;       // 1-based physical line in the input
   std::vector<std::string> fields;  // trimmed, unquoted
+  bool unclosedQuote = false;       // a double quote opened and not closed: the fields are not trustworthy
   std::vector<double> numbers;      // the fields as numbers, filled by runRows() for numeric input
 };
 

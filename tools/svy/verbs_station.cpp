@@ -54,7 +54,7 @@ bool isStationText(const std::string& text) {
 
 // The station interval option: metres per station unit, e.g. 1000 or 100.
 void addIntervalOption(CLI::App& verb, double& interval) {
-  verb.add_option("--interval", interval, "Metres per station unit (e.g. 1000 or 100)")
+  svy_tool::requireNumberText(verb.add_option("--interval", interval, "Metres per station unit (e.g. 1000 or 100)"))
       ->required()
       ->check(CLI::PositiveNumber);
 }

@@ -1,0 +1,168 @@
+// Damaged input to every svy verb that reads rows: each verb's clean rows with one bad row inserted after the
+// first must give the clean output, one message for that line and exit status 1; accepted variations of the
+// file (byte-order mark, CRLF, a header, comments) must give the clean output exactly.
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "svy_runner.h"
+
+namespace {
+
+using svy_test::runSvy;
+using svy_test::SvyResult;
+
+// One line per verb invocation: its arguments, its input column names and clean rows (the first row's
+// first field is the one the damaged rows replace). A new verb joins the tables with one line here.
+struct RowVerb {
+  const char* args;
+  const char* header;
+  const char* rows;
+};
+const RowVerb kRowVerbs[] = {
+    {"cogo inverse", "n1,e1,n2,e2", "0,0,3,4\n5000000.5,500000.25,5000100,500050\n"},
+    {"cogo radiate", "n,e,azimuth_deg,distance", "100,200,45,10\n0,0,270,5\n"},
+    {"angle convert --from dms --to deg", "value", "45.3015\n-12.05\n"},
+    {"station format --interval 1000", "chainage", "1234.567\n-5\n"},
+    {"station parse --interval 1000", "text", "1+234.57\n\"0+5,5\"\n"},
+    {"units convert --from ft-us --to m", "value", "1000\n0.5\n"},
+    {"fit line", "n,e", "0,0\n1,1.1\n2,1.9\n3,3\n"},
+    {"fit circle", "n,e", "10,0\n0,10\n-10,0\n0,-10.1\n"},
+    {"fit radius --center 0,0", "n,e", "10,0\n0,10.1\n-10,0\n"},
+    {"geo to-ecef", "lat_deg,lon_deg,h", "45,7,300\n-33.5,151.25,20\n"},
+    {"geo to-geodetic", "x,y,z", "4400000,600000,4500000\n6378137,0,0\n"},
+    {"geo enu --origin 45,7,300", "x,y,z", "4500000,550000,4490000\n4510000,552000,4480000\n"},
+    {"time to-gps", "time", "2024-01-01T00:00:00\n2000-02-29T12:30:00.25\n"},
+    {"time from-gps", "week,seconds_of_week", "2295,86400\n1000,0.5\n"},
+};
+
+std::string replaceAll(std::string text, const std::string& from, const std::string& to) {
+  for (std::size_t at = 0; (at = text.find(from, at)) != std::string::npos; at += to.size()) {
+    text.replace(at, from.size(), to);
+  }
+  return text;
+}
+
+std::vector<std::string> argsOf(const RowVerb& verb) { return svy_test::split(verb.args, ' '); }
+
+// A text that holds no number, date or station, whatever a verb reads. ("abc" as a time once read past the
+// end of the text: the sanitizer build catches such a fault here.) The first field of a row is
+// replaced by it; a row that gains a field is too long for every verb.
+const char* const kDecimalComma = "\"1234,5\"";
+struct Damage {
+  const char* what;
+  std::string field;
+};
+std::vector<Damage> damagedFields() {
+  return {{"letters", "abc"},
+          {"not a number", "nan"},
+          {"infinity", "inf"},
+          {"negative infinity", "-inf"},
+          {"beyond double", "1e400"},
+          {"hexadecimal", "0x10"},
+          {"thousands separator", "\"1,234.5\""},
+          {"blank thousands separator", "1 234.5"},
+          {"decimal comma", kDecimalComma},
+          {"NUL byte", std::string("12\0" "3", 4)},
+          {"lone carriage return", "12\r3"},
+          {"control byte", "\x1b[2J"},
+          {"invalid UTF-8", "\xff\xfe"},
+          {"very long line", std::string(200000, '7') + "x"},
+          {"unclosed quote", "\"12"}};
+}
+
+// The bad row sits on line 2, between the verb's first clean row and the others.
+std::string withBadRow(const RowVerb& verb, const std::string& badRow) {
+  const std::string rows = verb.rows;
+  const std::size_t firstEnd = rows.find('\n') + 1;
+  return rows.substr(0, firstEnd) + badRow + "\n" + rows.substr(firstEnd);
+}
+
+TEST(SvyBadInput, EveryBadRowReportedOnceWhileTheCleanRowsComeOut) {
+  for (const RowVerb& verb : kRowVerbs) {
+    std::vector<std::string> jsonArgs = argsOf(verb);
+    jsonArgs.insert(jsonArgs.begin(), "--json");
+    const SvyResult clean[] = {runSvy(argsOf(verb), verb.rows), runSvy(jsonArgs, verb.rows)};
+    ASSERT_EQ(clean[0].exitStatus, 0) << verb.args << ": " << clean[0].err;
+    const std::string firstRow = std::string(verb.rows).substr(0, std::string(verb.rows).find('\n'));
+    const std::string rest = firstRow.substr(std::min(firstRow.find(','), firstRow.size()));
+    std::vector<std::pair<std::string, std::string>> badRows = {{"an extra field", firstRow + ",1"}};
+    for (const Damage& damage : damagedFields()) {
+      // Station text takes a decimal comma, as the library's station reader does ("0+5,5" is a clean row).
+      if (damage.field == kDecimalComma && std::string(verb.args).rfind("station parse", 0) == 0) continue;
+      badRows.emplace_back(damage.what, damage.field + rest);
+    }
+    for (const auto& [what, badRow] : badRows) {
+      SCOPED_TRACE(std::string(verb.args) + ", " + what);
+      for (const bool json : {false, true}) {
+        const SvyResult r = runSvy(json ? jsonArgs : argsOf(verb), withBadRow(verb, badRow));
+        EXPECT_EQ(r.exitStatus, 1);
+        EXPECT_EQ(r.out, clean[json].out);
+        ASSERT_EQ(r.errLines().size(), 1u) << r.err;
+        EXPECT_EQ(r.err.rfind("svy: line 2: ", 0), 0u) << r.err;
+        EXPECT_LT(r.err.size(), 200u);
+        EXPECT_EQ(r.err.find_first_of(std::string("\0\r\x1b", 3)), std::string::npos) << r.err;
+      }
+    }
+  }
+}
+
+// Accepted: a UTF-8 byte-order mark, CRLF line ends, a header of the input column names, comments and
+// blank lines, no newline at the end. Each gives the clean output.
+TEST(SvyBadInput, AcceptedFileFormsGiveTheCleanOutput) {
+  const std::string bom = "\xEF\xBB\xBF";
+  for (const RowVerb& verb : kRowVerbs) {
+    const SvyResult clean = runSvy(argsOf(verb), verb.rows);
+    const std::string rows = verb.rows;
+    const std::string header = std::string(verb.header) + "\n";
+    const std::string forms[] = {bom + rows,
+                                 replaceAll(rows, "\n", "\r\n"),
+                                 header + rows,
+                                 bom + replaceAll(header + rows, "\n", "\r\n"),
+                                 "# surveyed 2024-05-02\n\n" + header + "\n" + replaceAll(rows, "\n", "\n# checked\n"),
+                                 rows.substr(0, rows.size() - 1)};
+    for (const std::string& input : forms) {
+      SCOPED_TRACE(std::string(verb.args) + ": " + input);
+      const SvyResult r = runSvy(argsOf(verb), input);
+      EXPECT_EQ(r.exitStatus, 0) << r.err;
+      EXPECT_EQ(r.out, clean.out);
+    }
+  }
+}
+
+// Nothing to read: the output header alone; a fit, which needs points, says so on one line.
+TEST(SvyBadInput, EmptyInputGivesTheHeaderAlone) {
+  for (const RowVerb& verb : kRowVerbs) {
+    const SvyResult clean = runSvy(argsOf(verb), verb.rows);
+    const std::string outputHeader = clean.lines().at(0) + "\n";
+    for (const std::string& input : {std::string(), std::string(verb.header) + "\n", std::string("\xEF\xBB\xBF")}) {
+      SCOPED_TRACE(std::string(verb.args) + ": " + input);
+      const SvyResult r = runSvy(argsOf(verb), input);
+      EXPECT_EQ(r.out, outputHeader);
+      const bool isFit = std::string(verb.args).rfind("fit ", 0) == 0;
+      EXPECT_EQ(r.exitStatus, isFit ? 1 : 0) << r.err;
+      EXPECT_EQ(r.errLines().size(), isFit ? 1u : 0u) << r.err;
+    }
+  }
+}
+
+// Verbs without rows take their numbers from options: what the rows refuse is refused there too, on one line.
+TEST(SvyBadInput, BadOptionNumbersGiveOneLineAndStatusTwo) {
+  const char* const verbs[] = {"curve solve --radius {} --delta 20", "curve solve --radius 300 --tangent {}",
+                               "spiral table --length 100 --radius {} --interval 10",
+                               "station format --interval {}"};
+  for (const char* verb : verbs) {
+    for (const char* value : {"abc", "nan", "inf", "1e400", "1,000", "1000,5", ""}) {
+      std::vector<std::string> args = svy_test::split(verb, ' ');
+      for (std::string& arg : args) arg = replaceAll(arg, "{}", value);
+      SCOPED_TRACE(std::string(verb) + " with " + value);
+      const SvyResult r = runSvy(args, "1\n");
+      EXPECT_EQ(r.exitStatus, 2);
+      EXPECT_EQ(r.out, "");
+      EXPECT_EQ(r.errLines().size(), 1u) << r.err;
+    }
+  }
+}
+
+}  // namespace
