@@ -5,6 +5,9 @@
 #include <vector>
 
 #include "svymath/cogo/circle_solvers.h"
+#include "svymath/cogo/circle_tangents.h"
+#include "svymath/cogo/cogo_intersections.h"
+#include "svymath/cogo/cogo_inverse.h"
 #include "svymath/cogo/inverse_radiate.h"
 
 namespace {
@@ -73,5 +76,42 @@ void BM_TwoCircles(benchmark::State& state) {
   }
 }
 BENCHMARK(BM_TwoCircles);
+
+void BM_IntersectBearings(benchmark::State& state) {
+  const std::vector<C2dPos> targets = targetsAround(kStation, 64);
+  const CMathAngle az1(30.0), az2(100.0);
+  std::size_t i = 0;
+  for (auto _ : state) {
+    C2dPos crossing;
+    benchmark::DoNotOptimize(CogoFunctions::eIntersectBearings(kStation, az1, targets[i++ & 63u], az2, crossing));
+    benchmark::DoNotOptimize(crossing);
+  }
+}
+BENCHMARK(BM_IntersectBearings);
+
+void BM_TangentsOfTwoCircles(benchmark::State& state) {
+  const std::vector<C2dPos> targets = targetsAround(kStation, 64);
+  svy_math::TTangentToCircles tangents;
+  std::size_t i = 0;
+  for (auto _ : state) {
+    benchmark::DoNotOptimize(tangents.solve(kStation, 5.0, targets[i++ & 63u], 3.0));
+    benchmark::DoNotOptimize(tangents.tangent(0));
+  }
+}
+BENCHMARK(BM_TangentsOfTwoCircles);
+
+// The nearest point of a polyline of as many vertices as the argument: one pass over its segments.
+void BM_InverseToPolyline(benchmark::State& state) {
+  const std::vector<C2dPos> around = targetsAround(kStation, static_cast<int>(state.range(0)));
+  const svy_vector<C2dPos> polyline(around.begin(), around.end());
+  const std::vector<C2dPos> probes = targetsAround(kStation, 64);
+  std::size_t i = 0;
+  for (auto _ : state) {
+    CogoFunctions::TElementInverse inverse;
+    benchmark::DoNotOptimize(CogoFunctions::eInverseToPolyline(polyline, false, probes[i++ & 63u], inverse));
+    benchmark::DoNotOptimize(inverse);
+  }
+}
+BENCHMARK(BM_InverseToPolyline)->Arg(16)->Arg(1024);
 
 }  // namespace

@@ -13,8 +13,6 @@ using svy_math::tol::kZero;
 
 bool isPositiveRadius(double radius) { return radius >= kZero && std::isfinite(radius); }
 
-bool isFinitePos(const C2dPos& p) { return std::isfinite(p.north()) && std::isfinite(p.east()); }
-
 void writeBoth(const C2dPos& p, C2dPos& solution1, C2dPos& solution2) {
   solution1 = p;
   solution2 = p;
@@ -37,7 +35,7 @@ double touchingPointAlongCentres(double distance, double radius1, double radius2
 int IntersectionCoordsOfLineAndCircle(const C2dPos& linePos1, const C2dPos& linePos2,
                                       const C2dPos& center, double radius, C2dPos& solution1,
                                       C2dPos& solution2) {
-  if (!isPositiveRadius(radius) || !isFinitePos(center)) return 0;
+  if (!isPositiveRadius(radius) || !center.isFinite()) return 0;
   const double dN = linePos2.north() - linePos1.north();
   const double dE = linePos2.east() - linePos1.east();
   if (-kZero < dN && dN < kZero && -kZero < dE && dE < kZero) return 0;
@@ -84,7 +82,7 @@ int IntersectionCoordsOfLineAndCircle(const C2dPos& linePos1, const C2dPos& line
   };
   const C2dPos first = toPos(uFirst);
   const C2dPos second = toPos(uSecond);
-  if (!isFinitePos(first) || !isFinitePos(second)) return 0;
+  if (!first.isFinite() || !second.isFinite()) return 0;
   solution1 = first;
   solution2 = second;
   return count;
@@ -93,7 +91,7 @@ int IntersectionCoordsOfLineAndCircle(const C2dPos& linePos1, const C2dPos& line
 int IntersectionCoordsOfTwoCircles(const C2dPos& center1, double radius1, const C2dPos& center2,
                                    double radius2, C2dPos& solution1, C2dPos& solution2) {
   if (!isPositiveRadius(radius1) || !isPositiveRadius(radius2)) return 0;
-  if (!isFinitePos(center1) || !isFinitePos(center2)) return 0;
+  if (!center1.isFinite() || !center2.isFinite()) return 0;
   const double dN = center2.north() - center1.north();
   const double dE = center2.east() - center1.east();
   const double distance = std::hypot(dN, dE);
@@ -120,7 +118,7 @@ int IntersectionCoordsOfTwoCircles(const C2dPos& center1, double radius1, const 
   if (touching || !(halfChordSq > 0.0)) {
     const C2dPos touchPoint = alongCentreLine(
         touchingPointAlongCentres(distance, radius1, radius2, externalGap, internalGap));
-    if (!isFinitePos(touchPoint)) return 0;
+    if (!touchPoint.isFinite()) return 0;
     writeBoth(touchPoint, solution1, solution2);
     return 1;
   }
@@ -129,7 +127,7 @@ int IntersectionCoordsOfTwoCircles(const C2dPos& center1, double radius1, const 
   const double halfChord = std::sqrt(halfChordSq);
   const C2dPos right(chordMiddle.north() - halfChord * uE, chordMiddle.east() + halfChord * uN);
   const C2dPos left(chordMiddle.north() + halfChord * uE, chordMiddle.east() - halfChord * uN);
-  if (!isFinitePos(right) || !isFinitePos(left)) return 0;
+  if (!right.isFinite() || !left.isFinite()) return 0;
   solution1 = right;
   solution2 = left;
   return 2;

@@ -29,16 +29,28 @@ constexpr double kPolarAxisDistance = 1e-10;
 // earth near the equatorial plane (where the map's slope approaches 1) need up to a few million. Reaching
 // the cap ends with NaN instead of looping.
 constexpr int kGeodeticIterationCap = 100000000;
-// Geodesic inverse (azimuth between two geodetic positions): the longitude on the auxiliary sphere is
-// iterated until it changes by less than this (radians, 0.006 mm on the earth), at most kGeodesicIterationCap
-// times.
-constexpr double kGeodesicLongitude = 1e-12;
-constexpr int kGeodesicIterationCap = 200;
-// Nearly antipodal pairs: where the classic iteration fails, a damped one (each step moves this fraction of
-// the classic update, at most kGeodesicDampedCap steps) settles for all but ~0.3% of pairs within 1 deg of
-// the antipode; the rest take the auxiliary great-circle azimuth.
-constexpr double kGeodesicRelaxation = 0.05;
-constexpr int kGeodesicDampedCap = 10000;
+// Geodesic inverse: Newton's method on the azimuth at the first point stops once the longitude misclosure
+// is within this (radians: the spacing of doubles at 1, 1.4e-9 m on the earth); it is 8 times this
+// after a Newton step already judged converged, where rounding can hold the misclosure a few ulps away.
+constexpr double kGeodesicLongitude = 2.220446049250313e-16;
+// Newton steps before the solver falls back to bisection alone, and the cap of all steps. Newton converges
+// in 2 to 5 steps from the starting azimuth (antipodal pairs included); each bisection halves the bracket
+// of the azimuth, so 63 more reach the resolution of a double.
+constexpr int kGeodesicNewtonSteps = 20;
+constexpr int kGeodesicSolverSteps = 83;
+// A bisection bracket narrower than this (radians, epsilon^1.5) cannot shrink further.
+constexpr double kGeodesicBracket = 3.308722450212111e-24;
+// Guard against dividing by an exact zero: the cosine of a latitude at a pole, an equatorial azimuth
+// (sqrt of the smallest normal double).
+constexpr double kGeodesicTiny = 1.4916681462400413e-154;
+// Pairs closer than this on the auxiliary sphere (radians, about 0.2 m) are solved in closed form on a
+// sphere scaled at their mean latitude: its error there, of order f sigma^3, is below a double's resolution.
+constexpr double kGeodesicShortLine = 3.6e-08;
+// Starting azimuth near the antipode: pairs within kGeodesicAntipodalStrip (radians of reduced latitude,
+// 200 epsilon) of the equatorial cut, and no more than kGeodesicCutMargin (a fraction of the cut's
+// half-length) beyond its end, start from the meridian-like azimuth; the others from the astroid.
+constexpr double kGeodesicAntipodalStrip = 4.440892098500626e-14;
+constexpr double kGeodesicCutMargin = 1.4901161193847656e-05;
 
 }  // namespace tol
 
@@ -96,11 +108,33 @@ constexpr double kLinearCoeffZero = 1e-5;
 // up to sqrt(2 R 1e-8) from the touching point (1.4 mm for R = 100 m): the precision to which data
 // rounded at that level defines a touching point anyway.
 constexpr double kTangency = 1e-8;
+// Control points of a plane localization spread (root mean square about their centroid) over less than this
+// (metres) fix no rotation or scale: they count as coincident.
+constexpr double kControlSpread = 1e-3;
+// A localization control point is flagged when its externally studentized residual exceeds this: a 2-D
+// residual beyond three of its standard deviations, 1.1% likely for a good point (chi-square, 2 degrees).
+constexpr double kOutlierFactor = 3.0;
+// A residual shorter than this (metres) is rounding of exact control, never a blunder: doubles at
+// N 10 000 000 are 2e-9 m apart and a fit over a few of them loses a few hundred such steps.
+constexpr double kResidualZero = 1e-6;
+
+// Two bearings whose unit directions have a cross product (the sine of the angle between them) strictly
+// within +-1e-12 are parallel: their crossing would lie more than 1e12 times the points' separation away.
+constexpr double kParallelSine = 1e-12;
 
 }  // namespace tol
 
 namespace units {
 
+// Refraction coefficient of the line of sight over land by day (the ratio of the earth's radius to that
+// of the light path), the usual default of trigonometric heighting.
+constexpr double kRefractionCoefficient = 0.13;
+// Default a-priori accuracies of a total station: 3 seconds of arc for directions and zenith angles
+// (radians), 2 mm + 2 ppm for distances.
+constexpr double kDefaultAngleSd = 1.454441043328608e-05;
+constexpr double kDefaultDistanceSd = 0.002;
+constexpr double kDefaultDistancePpm = 2.0;
+constexpr double kPartsPerMillion = 1e-6;
 // Radius of the spherical earth used for small steps in latitude and longitude (metres).
 constexpr double kSphereEarthRadius = 6.371e6;
 // Degrees of latitude per metre on that sphere: 180 / (pi * 6.371e6).
@@ -222,7 +256,21 @@ constexpr int kJacobiSweepCap = 100;
 // a hundred times that, only ends a problem whose convergence criteria can never be met.
 constexpr int kGaussNewtonIterationCap = 1000;
 
+// Orientations tried for the starting position (a half-degree grid): Gauss-Newton converges from within a
+// few degrees of any sound geometry.
+constexpr int kResectionOrientationSteps = 720;
+
 }  // namespace limits
+
+namespace tol {
+
+// Free-station resection: Gauss-Newton stops once the station moves by less than kResectionPosition
+// (metres) and the orientation turns by less than kResectionOrientation (radians, 1e-12 rad is 0.001 mm at
+// 1000 km), far below survey precision and well above the rounding of local coordinates.
+constexpr double kResectionPosition = 1e-9;
+constexpr double kResectionOrientation = 1e-12;
+
+}  // namespace tol
 
 // Circular-curve formulas (radius, deflection, degree of curve, tangent, external, middle ordinate).
 namespace tol {

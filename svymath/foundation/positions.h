@@ -5,6 +5,7 @@
 // up on the map), component 1 is E (grid east, right). Azimuths are radians clockwise from north,
 // azimuth = atan2(dE, dN); the unit direction of azimuth a is (N = cos a, E = sin a). Offsets are positive
 // to the right of the direction of travel.
+#include <cmath>
 #include <type_traits>
 
 #include "svymath/foundation/abstract_point.h"
@@ -27,6 +28,8 @@ class C2dPos : public svy_math::TAbstractPoint2<double> {
   double north() const { return m_comp[0]; }
   double& east() { return m_comp[1]; }
   double east() const { return m_comp[1]; }
+  // Whether northing and easting are both finite numbers.
+  bool isFinite() const { return std::isfinite(m_comp[0]) && std::isfinite(m_comp[1]); }
 };
 
 static_assert(sizeof(C2dPos) == 2 * sizeof(double), "a position is two doubles");
@@ -74,6 +77,12 @@ class SVYMATH_API Coord : public svy_math::TAbstractPoint3<double> {
 
   // Geodetic (latitude, longitude, ellipsoidal height) to Cartesian; defined with the geodesy functions.
   Coord& blh2xyz(const GeoCoord& geodetic);
+  // Moves this position by a local (east, north, up) vector (metres) in the local-level frame at this
+  // position (defined with the geodesy functions). False, unchanged, when a value is not finite.
+  bool offsetCoord(const svy_math::TAbstractPoint3<double>& enu);
+  // The (east, north, up) vector (metres) from this position to `other` in the local-level frame here.
+  // False (enu unchanged) when a value is not finite.
+  bool relatCoord(const Coord& other, svy_math::TAbstractPoint3<double>& enu) const;
 };
 
 static_assert(sizeof(Coord) == 3 * sizeof(double), "a Cartesian coordinate is three doubles");

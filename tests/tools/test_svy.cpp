@@ -101,6 +101,8 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
       {"spiral table --length 100 --radius 300 --interval 1e-9", "interval"},
       {"spiral table --type bloss --length 100 --radius 300 --interval 1", "bloss"},
       {"spiral table --length 100 --radius 0 --interval 1", "radius"},
+      {"cogo intersect --mode xy", "--mode"}, {"traverse adjust", "--start"}, {"traverse adjust --start 1", "--start"},
+      {"traverse adjust --start 0,0 --rule simple", "--rule"},
   };
   for (const auto& [args, message] : cases) {
     SCOPED_TRACE(args);
@@ -113,7 +115,7 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
   }
   const SvyResult help = runSvy({"--help"});
   EXPECT_EQ(help.exitStatus, 0);
-  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time"}) {
+  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "traverse"}) {
     EXPECT_NE(help.out.find(family), std::string::npos) << family;
   }
 }

@@ -27,6 +27,9 @@ int runCommand(int argc, const char* const* argv) {
     registerCurveVerbs(app);
     registerGeoVerbs(app);
     registerTimeVerbs(app);
+    registerLocalizeVerbs(app);
+    registerResectVerbs(app);
+    registerTraverseVerbs(app);
 
     try {
       app.parse(argc, argv);

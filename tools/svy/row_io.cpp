@@ -233,10 +233,21 @@ RowWriter::RowWriter(std::ostream& out, std::vector<Column> columns, OutputOptio
 
 RowWriter::~RowWriter() { finish(); }
 
+void RowWriter::setJsonEnvelope(std::vector<JsonGroup> groups, std::string rowsKey) {
+  envelopeGroups_ = std::move(groups);
+  envelopeRowsKey_ = std::move(rowsKey);
+}
+
 void RowWriter::start() {
   if (started_) return;
   started_ = true;
   if (options_.json) {
+    if (!envelopeRowsKey_.empty()) {
+      out_ << '{';
+      for (const JsonGroup& group : envelopeGroups_)
+        out_ << nlohmann::json(group.name).dump() << ':' << jsonObject(group.columns, group.cells) << ',';
+      out_ << nlohmann::json(envelopeRowsKey_).dump() << ':';
+    }
     out_ << '[';
     return;
   }
@@ -253,23 +264,7 @@ void RowWriter::write(const std::vector<Cell>& cells) {
   start();
   const std::size_t count = std::min(cells.size(), columns_.size());
   if (options_.json) {
-    nlohmann::ordered_json object = nlohmann::ordered_json::object();
-    for (std::size_t i = 0; i < count; ++i) {
-      const Column& column = columns_[i];
-      if (const auto* text = std::get_if<std::string>(&cells[i])) {
-        object[column.name] = *text;
-        continue;
-      }
-      const double value = std::get<double>(cells[i]);
-      double shown = value;
-      // The rounded value, so that JSON and CSV agree; JSON gives it back in its shortest exact form.
-      if (!options_.fullPrecision && std::isfinite(value)) parseNumber(formatNumber(value, column.decimals), shown);
-      object[column.name] = shown;
-    }
-    // Text echoed from the input may not be valid UTF-8 (a file in a legacy code page): such bytes are
-    // written as U+FFFD instead of failing the whole output.
-    out_ << (rowsWritten_ ? ",\n" : "\n")
-         << object.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace);
+    out_ << (rowsWritten_ ? ",\n" : "\n") << jsonObject(columns_, cells);
   } else {
     for (std::size_t i = 0; i < count; ++i) out_ << (i ? "," : "") << csvCell(cells[i], columns_[i]);
     out_ << '\n';
@@ -277,11 +272,31 @@ void RowWriter::write(const std::vector<Cell>& cells) {
   ++rowsWritten_;
 }
 
+std::string RowWriter::jsonObject(const std::vector<Column>& columns, const std::vector<Cell>& cells) const {
+  nlohmann::ordered_json object = nlohmann::ordered_json::object();
+  const std::size_t count = std::min(cells.size(), columns.size());
+  for (std::size_t i = 0; i < count; ++i) {
+    const Column& column = columns[i];
+    if (const auto* text = std::get_if<std::string>(&cells[i])) {
+      object[column.name] = *text;
+      continue;
+    }
+    const double value = std::get<double>(cells[i]);
+    double shown = value;
+    // The rounded value, so that JSON and CSV agree; JSON gives it back in its shortest exact form.
+    if (!options_.fullPrecision && std::isfinite(value)) parseNumber(formatNumber(value, column.decimals), shown);
+    object[column.name] = shown;
+  }
+  // Text echoed from the input may not be valid UTF-8 (a file in a legacy code page): such bytes are
+  // written as U+FFFD instead of failing the whole output.
+  return object.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace);
+}
+
 void RowWriter::finish() {
   if (finished_) return;
   start();
   finished_ = true;
-  if (options_.json) out_ << (rowsWritten_ ? "\n]\n" : "]\n");
+  if (options_.json) out_ << (rowsWritten_ ? "\n]" : "]") << (envelopeRowsKey_.empty() ? "\n" : "}\n");
   out_.flush();
 }
 
@@ -344,37 +359,79 @@ bool parseNumberList(const std::string& text, std::size_t count, std::vector<dou
   return true;
 }
 
-int runRows(std::istream& in, std::ostream& out, const RowFormat& format, const OutputOptions& options,
-            const RowHandler& handler) {
-  RowReader reader(in, format.inputs, format.numericInput);
-  RowWriter writer(out, format.outputs, options);
-  int status = kExitOk;
-  InputRow row;
-  std::vector<Cell> cells;
-  std::string error;
-  while (reader.next(row)) {
-    cells.clear();
-    error.clear();
-    if (!checkRow(format, row, error) || !handler(row, cells, error)) {
-      reportBadRow(row.lineNumber, error.empty() ? "no result" : error);
-      status = kExitBadRows;
-      continue;
-    }
-    writer.write(cells);
-  }
-  writer.finish();
-  return status;
-}
-
-int runRows(const std::string& inputPath, const RowFormat& format, const OutputOptions& options,
-            const RowHandler& handler) {
+int readAllRows(const std::string& inputPath, const RowFormat& format, const RowTaker& take) {
   std::string error;
   const std::unique_ptr<std::istream> in = openInput(inputPath, error);
   if (!in) {
     std::cerr << "svy: " << error << '\n';
     return kExitUsage;
   }
-  return runRows(*in, std::cout, format, options, handler);
+  RowReader reader(*in, format.inputs, format.numericInput);
+  InputRow row;
+  int status = kExitOk;
+  while (reader.next(row)) {
+    error.clear();
+    if (!checkRow(format, row, error) || !take(row, error)) {
+      reportBadRow(row.lineNumber, error.empty() ? "no result" : error);
+      status = kExitBadRows;
+    }
+  }
+  return status;
+}
+
+int runMultiRows(std::istream& in, std::ostream& out, const RowFormat& format, const OutputOptions& options,
+                 const MultiRowHandler& handler) {
+  RowReader reader(in, format.inputs, format.numericInput);
+  RowWriter writer(out, format.outputs, options);
+  int status = kExitOk;
+  InputRow row;
+  std::vector<std::vector<Cell>> rows;
+  std::string error;
+  while (reader.next(row)) {
+    rows.clear();
+    error.clear();
+    if (!checkRow(format, row, error) || !handler(row, rows, error)) {
+      reportBadRow(row.lineNumber, error.empty() ? "no result" : error);
+      status = kExitBadRows;
+      continue;
+    }
+    for (const std::vector<Cell>& cells : rows) writer.write(cells);
+  }
+  writer.finish();
+  return status;
+}
+
+int runMultiRows(const std::string& inputPath, const RowFormat& format, const OutputOptions& options,
+                 const MultiRowHandler& handler) {
+  std::string error;
+  const std::unique_ptr<std::istream> in = openInput(inputPath, error);
+  if (!in) {
+    std::cerr << "svy: " << error << '\n';
+    return kExitUsage;
+  }
+  return runMultiRows(*in, std::cout, format, options, handler);
+}
+
+namespace {
+
+// A one-row handler seen as a handler of several rows.
+MultiRowHandler asMultiRow(const RowHandler& handler) {
+  return [&handler](const InputRow& row, std::vector<std::vector<Cell>>& out, std::string& error) {
+    out.emplace_back();
+    return handler(row, out.back(), error);
+  };
+}
+
+}  // namespace
+
+int runRows(std::istream& in, std::ostream& out, const RowFormat& format, const OutputOptions& options,
+            const RowHandler& handler) {
+  return runMultiRows(in, out, format, options, asMultiRow(handler));
+}
+
+int runRows(const std::string& inputPath, const RowFormat& format, const OutputOptions& options,
+            const RowHandler& handler) {
+  return runMultiRows(inputPath, format, options, asMultiRow(handler));
 }
 
 }  // namespace svy_tool

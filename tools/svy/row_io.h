@@ -30,7 +30,9 @@
 //         }));
 //   });
 //
-// Verbs that read all rows before writing (fits, totals) use RowReader and RowWriter directly.
+// Verbs whose input rows give several output rows each (intersections with two solutions) use
+// runMultiRows(). Verbs that read all rows before writing (fits, totals, traverses) use RowReader and
+// RowWriter directly.
 
 #include <cstddef>
 #include <functional>
@@ -122,6 +124,13 @@ class RowReader {
 // sets the message ("cannot open 'x': No such file or directory").
 std::unique_ptr<std::istream> openInput(const std::string& path, std::string& error);
 
+// A named group of values that a verb writes beside its rows in JSON: "name": {"column": value, ...}.
+struct JsonGroup {
+  std::string name;
+  std::vector<Column> columns;
+  std::vector<Cell> cells;
+};
+
 // Writes rows as CSV or as a JSON array. The header (CSV) or the opening bracket (JSON) is written with the
 // first row or at finish(), so that an empty input still gives a well-formed output.
 class RowWriter {
@@ -131,6 +140,10 @@ class RowWriter {
   RowWriter(const RowWriter&) = delete;
   RowWriter& operator=(const RowWriter&) = delete;
 
+  // With --json, writes one object instead of the array: the groups first, then the rows as an array under
+  // rowsKey ({"misclosure": {...}, "points": [...]}). Call before the first row; CSV output ignores it.
+  void setJsonEnvelope(std::vector<JsonGroup> groups, std::string rowsKey);
+
   // Writes one row; cells must match the columns in number.
   void write(const std::vector<Cell>& cells);
   // Closes the output (the JSON array's bracket); called by the destructor when not called before.
@@ -139,6 +152,8 @@ class RowWriter {
  private:
   void start();
   std::string csvCell(const Cell& cell, const Column& column) const;
+  // One JSON object of the cells keyed by the columns' names, numbers rounded as in CSV.
+  std::string jsonObject(const std::vector<Column>& columns, const std::vector<Cell>& cells) const;
 
   std::ostream& out_;
   std::vector<Column> columns_;
@@ -146,6 +161,8 @@ class RowWriter {
   std::size_t rowsWritten_ = 0;
   bool started_ = false;
   bool finished_ = false;
+  std::vector<JsonGroup> envelopeGroups_;
+  std::string envelopeRowsKey_;  // empty: a plain array
 };
 
 // Input text for a message, in single quotes and cut to a few dozen bytes ("'1111111...'").
@@ -182,5 +199,25 @@ int runRows(const std::string& inputPath, const RowFormat& format, const OutputO
 // The same over given streams, for callers that already hold them.
 int runRows(std::istream& in, std::ostream& out, const RowFormat& format, const OutputOptions& options,
             const RowHandler& handler);
+
+// Takes one good input row of a verb that reads all rows before writing; returns false with a message to
+// report the row as bad instead.
+using RowTaker = std::function<bool(const InputRow& row, std::string& error)>;
+
+// Reads every row of the input, checks each against the format and hands the good ones to `take`; bad rows
+// are reported. Returns kExitOk, kExitBadRows when a row was reported, or kExitUsage when the input cannot
+// be opened (also reported).
+int readAllRows(const std::string& inputPath, const RowFormat& format, const RowTaker& take);
+
+// Computes the output rows of one input row (any number, each matching the output columns), or sets the
+// message and returns false.
+using MultiRowHandler =
+    std::function<bool(const InputRow& row, std::vector<std::vector<Cell>>& out, std::string& error)>;
+
+// runRows() for verbs that give several output rows (or none) per input row.
+int runMultiRows(const std::string& inputPath, const RowFormat& format, const OutputOptions& options,
+                 const MultiRowHandler& handler);
+int runMultiRows(std::istream& in, std::ostream& out, const RowFormat& format, const OutputOptions& options,
+                 const MultiRowHandler& handler);
 
 }  // namespace svy_tool

@@ -1,11 +1,13 @@
-// svy curve and svy spiral: the circular-curve quantities from a radius and one more value, and tables of
-// transition spirals in their local frame (origin at the tangent point, north along the initial tangent,
-// east to the right).
+// svy curve and svy spiral: the circular-curve quantities from a radius and one more value, the
+// spiral-arc-spiral group about an intersection point, and tables of transition spirals in their local frame
+// (origin at the tangent point, north along the initial tangent, east to the right).
 #include "row_io.h"
 #include "verbs.h"
 
 #include "svymath/curves/curve_data_spiral1r.h"
 #include "svymath/curves/curve_formulas.h"
+#include "svymath/curves/curve_ip.h"
+#include "svymath/foundation/constants.h"
 
 #include <CLI/CLI.hpp>
 
@@ -127,6 +129,92 @@ void addSolve(CLI::App& family) {
   });
 }
 
+// Why a group about an intersection point could not be laid out, for the row's message.
+std::string ipFailure(const CCurveIp& group, const std::string& type) {
+  switch (group.getStatus()) {
+    case eCurveIpNoTangent:
+      return "the previous or the next point coincides with the IP";
+    case eCurveIpCollinear:
+      return "the tangents run straight on through the IP: no curve to fit";
+    case eCurveIpReversal:
+      return "the tangents turn back on themselves at the IP";
+    case eCurveIpSpiralUnreachable:
+      return "no " + type + " spiral of the given length reaches radius " + messageNumber(std::fabs(group.getRadius()));
+    case eCurveIpSpiralsTooLong:
+      return "the spirals turn further than the deflection of " +
+             messageNumber(std::fabs(group.getDeflection()) * svy_math::units::kRadToDeg) + " degrees";
+    default:
+      return "no finite curve fits the tangents";
+  }
+}
+
+void addIp(CLI::App& family) {
+  CLI::App* verb = family.add_subcommand(
+      "ip", "Spiral-arc-spiral curve about an intersection point, from the previous, the IP and the next point");
+  std::shared_ptr<std::string> input = svy_tool::addInputArgument(*verb);
+  auto radius = std::make_shared<double>(0.0);
+  auto spiralIn = std::make_shared<double>(0.0);
+  auto spiralOut = std::make_shared<double>(0.0);
+  auto type = std::make_shared<std::string>("clothoid");
+  verb->add_option("--radius", *radius, "Radius of the arc (the turn comes from the points)")
+      ->required()
+      ->check(CLI::PositiveNumber);
+  verb->add_option("--spiral-in", *spiralIn, "Length of the entry spiral (TS to SC)")->check(CLI::NonNegativeNumber);
+  verb->add_option("--spiral-out", *spiralOut, "Length of the exit spiral (CS to ST)")->check(CLI::NonNegativeNumber);
+  verb->add_option("--type", *type, "Spiral law")->check(CLI::IsMember({"clothoid", "cubic"}));
+
+  verb->callback([=] {
+    if (!std::isfinite(*radius) || !std::isfinite(*spiralIn) || !std::isfinite(*spiralOut)) {
+      throw CLI::ValidationError("--radius, --spiral-in and --spiral-out must be finite");
+    }
+    const svy_tool::RowFormat format{{"n_prev", "e_prev", "n_ip", "e_ip", "n_next", "e_next"},
+                                     true,
+                                     {{"deflection_deg", kAngleDecimals},
+                                      {"tangent_in", kLengthDecimals},
+                                      {"tangent_out", kLengthDecimals},
+                                      {"shift_in", kLengthDecimals},
+                                      {"shift_out", kLengthDecimals},
+                                      {"length", kLengthDecimals},
+                                      {"ts_n", kLengthDecimals},
+                                      {"ts_e", kLengthDecimals},
+                                      {"sc_n", kLengthDecimals},
+                                      {"sc_e", kLengthDecimals},
+                                      {"cs_n", kLengthDecimals},
+                                      {"cs_e", kLengthDecimals},
+                                      {"st_n", kLengthDecimals},
+                                      {"st_e", kLengthDecimals}}};
+    const AlntMathSpiralType law = *type == "cubic" ? eMathSpiralCubic : eMathSpiralEuler;
+    svy_tool::finishVerb(svy_tool::runRows(
+        *input, format, svy_tool::outputOptionsFor(*verb),
+        [=](const svy_tool::InputRow& row, std::vector<svy_tool::Cell>& out, std::string& error) {
+          const std::vector<double>& v = row.numbers;
+          CCurveIp group;
+          group.setSpiralType(law);
+          if (!group.setIp(v[2], v[3], *radius, *spiralIn, *spiralOut) ||
+              !group.setNeighbours(C2dPos(v[0], v[1]), C2dPos(v[4], v[5]))) {
+            error = ipFailure(group, *type);
+            return false;
+          }
+          const C2dPos ts = group.getTS(), sc = group.getSC(), cs = group.getCS(), st = group.getST();
+          out = {group.getDeflection() * svy_math::units::kRadToDeg,
+                 group.getTangentIn(),
+                 group.getTangentOut(),
+                 group.getShiftIn(),
+                 group.getShiftOut(),
+                 group.getTotalLength(),
+                 ts.north(),
+                 ts.east(),
+                 sc.north(),
+                 sc.east(),
+                 cs.north(),
+                 cs.east(),
+                 st.north(),
+                 st.east()};
+          return true;
+        }));
+  });
+}
+
 void addTable(CLI::App& family) {
   CLI::App* verb = family.add_subcommand(
       "table", "Positions along a transition spiral in its local frame: north along the initial tangent");
@@ -183,9 +271,10 @@ void addTable(CLI::App& family) {
 }  // namespace
 
 void registerCurveVerbs(CLI::App& app) {
-  CLI::App* curve = app.add_subcommand("curve", "Circular curves");
+  CLI::App* curve = app.add_subcommand("curve", "Circular curves and curves about an intersection point");
   curve->require_subcommand(1);
   addSolve(*curve);
+  addIp(*curve);
   CLI::App* spiral = app.add_subcommand("spiral", "Transition spirals (clothoid, cubic parabola)");
   spiral->require_subcommand(1);
   addTable(*spiral);

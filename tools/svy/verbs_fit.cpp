@@ -27,25 +27,11 @@ constexpr double kFitConvergence = 1e-7;
 // Reads the points of the input; returns kExitOk, or kExitBadRows when a row was left out, or kExitUsage
 // when the input cannot be opened.
 int readPoints(const std::string& path, svy_list<C2dPos>& points) {
-  std::string error;
-  const std::unique_ptr<std::istream> in = svy_tool::openInput(path, error);
-  if (!in) {
-    std::cerr << "svy: " << error << '\n';
-    return svy_tool::kExitUsage;
-  }
-  const svy_tool::RowFormat format{{"n", "e"}, true, {}};
-  svy_tool::RowReader reader(*in, format.inputs, format.numericInput);
-  svy_tool::InputRow row;
-  int status = svy_tool::kExitOk;
-  while (reader.next(row)) {
-    if (!svy_tool::checkRow(format, row, error)) {
-      svy_tool::reportBadRow(row.lineNumber, error);
-      status = svy_tool::kExitBadRows;
-      continue;
-    }
-    points.push_back(C2dPos(row.numbers[0], row.numbers[1]));
-  }
-  return status;
+  return svy_tool::readAllRows(path, svy_tool::RowFormat{{"n", "e"}, true, {}},
+                               [&points](const svy_tool::InputRow& row, std::string&) {
+                                 points.push_back(C2dPos(row.numbers[0], row.numbers[1]));
+                                 return true;
+                               });
 }
 
 std::string failureText(svy_math::ELeastSquaresStatus status, const std::string& degenerate) {
