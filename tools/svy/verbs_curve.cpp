@@ -65,7 +65,8 @@ void addSolve(CLI::App& family) {
   auto radius = std::make_shared<double>(0.0);
   auto degArc = std::make_shared<double>(0.0);
   auto degChord = std::make_shared<double>(0.0);
-  CLI::Option* radiusOpt = svy_tool::requireNumberText(verb->add_option("--radius", *radius, "Radius"))->check(CLI::PositiveNumber);
+  CLI::Option* radiusOpt =
+      svy_tool::requireNumberText(verb->add_option("--radius", *radius, "Radius"))->check(CLI::PositiveNumber);
   CLI::Option* arcOpt = svy_tool::requireNumberText(
                             verb->add_option("--deg-arc", *degArc, "Degree of curve, arc definition (100-unit arc)"))
                             ->check(CLI::PositiveNumber);
@@ -156,11 +157,14 @@ void addIp(CLI::App& family) {
   auto spiralIn = std::make_shared<double>(0.0);
   auto spiralOut = std::make_shared<double>(0.0);
   auto type = std::make_shared<std::string>("clothoid");
-  verb->add_option("--radius", *radius, "Radius of the arc (the turn comes from the points)")
+  svy_tool::requireNumberText(
+      verb->add_option("--radius", *radius, "Radius of the arc (the turn comes from the points)"))
       ->required()
       ->check(CLI::PositiveNumber);
-  verb->add_option("--spiral-in", *spiralIn, "Length of the entry spiral (TS to SC)")->check(CLI::NonNegativeNumber);
-  verb->add_option("--spiral-out", *spiralOut, "Length of the exit spiral (CS to ST)")->check(CLI::NonNegativeNumber);
+  svy_tool::requireNumberText(verb->add_option("--spiral-in", *spiralIn, "Length of the entry spiral (TS to SC)"))
+      ->check(CLI::NonNegativeNumber);
+  svy_tool::requireNumberText(verb->add_option("--spiral-out", *spiralOut, "Length of the exit spiral (CS to ST)"))
+      ->check(CLI::NonNegativeNumber);
   verb->add_option("--type", *type, "Spiral law")->check(CLI::IsMember({"clothoid", "cubic"}));
 
   verb->callback([=] {
@@ -224,7 +228,9 @@ void addTable(CLI::App& family) {
   auto interval = std::make_shared<double>(0.0);
   auto exitSpiral = std::make_shared<bool>(false);
   verb->add_option("--type", *type, "Spiral law")->check(CLI::IsMember({"clothoid", "cubic"}));
-  svy_tool::requireNumberText(verb->add_option("--length", *length, "Spiral length"))->required()->check(CLI::PositiveNumber);
+  svy_tool::requireNumberText(verb->add_option("--length", *length, "Spiral length"))
+      ->required()
+      ->check(CLI::PositiveNumber);
   svy_tool::requireNumberText(
       verb->add_option("--radius", *radius, "Radius at the curve end; negative for a spiral turning left"))
       ->required();
