@@ -100,22 +100,13 @@ std::vector<Damage> damagedFields() {
           {"unclosed quote", "\"12"}};
 }
 
-// The bad row sits on line 2, between the verb's first clean row and the others.
-std::string withBadRow(const RowVerb& verb, const std::string& badRow) {
-  const std::string rows = verb.rows;
-  const std::size_t firstEnd = rows.find('\n') + 1;
-  return rows.substr(0, firstEnd) + badRow + "\n" + rows.substr(firstEnd);
-}
-
+// All the damaged rows of a verb in one input, on lines 2, 3, ... between its first clean row and the others:
+// each gives one message with its own line number (a damaged line never swallows the next), the clean rows
+// still come out in order, and each message is one short printable line.
 TEST(SvyBadInput, EveryBadRowReportedOnceWhileTheCleanRowsComeOut) {
   for (const RowVerb& verb : kRowVerbs) {
-    std::vector<std::string> jsonArgs = argsOf(verb);
-    jsonArgs.insert(jsonArgs.begin(), "--json");
-    // What a bad row leaves: the clean output, or for a figure the output of no rows at all.
-    const char* const expectedRows = verb.oneFigure ? "" : verb.rows;
-    const SvyResult clean[] = {runSvy(argsOf(verb), expectedRows), runSvy(jsonArgs, expectedRows)};
-    ASSERT_EQ(runSvy(argsOf(verb), verb.rows).exitStatus, 0) << verb.args;
-    const std::string firstRow = std::string(verb.rows).substr(0, std::string(verb.rows).find('\n'));
+    const std::string rows = verb.rows;
+    const std::string firstRow = rows.substr(0, rows.find('\n'));
     const std::size_t lastComma = firstRow.rfind(',');
     const std::string head = lastComma == std::string::npos ? std::string() : firstRow.substr(0, lastComma + 1);
     std::vector<std::pair<std::string, std::string>> badRows = {{"an extra field", firstRow + ",1"}};
@@ -124,16 +115,26 @@ TEST(SvyBadInput, EveryBadRowReportedOnceWhileTheCleanRowsComeOut) {
       if (damage.field == kDecimalComma && std::string(verb.args).rfind("station parse", 0) == 0) continue;
       badRows.emplace_back(damage.what, head + damage.field);
     }
-    for (const auto& [what, badRow] : badRows) {
-      SCOPED_TRACE(std::string(verb.args) + ", " + what);
-      for (const bool json : {false, true}) {
-        const SvyResult r = runSvy(json ? jsonArgs : argsOf(verb), withBadRow(verb, badRow));
-        EXPECT_EQ(r.exitStatus, 1);
-        EXPECT_EQ(r.out, clean[json].out);
-        ASSERT_EQ(r.errLines().size(), verb.oneFigure ? 2u : 1u) << r.err;
-        EXPECT_EQ(r.err.rfind("svy: line 2: ", 0), 0u) << r.err;
-        EXPECT_LT(r.err.size(), 200u);
-        EXPECT_EQ(r.err.find_first_of(std::string("\0\r\x1b", 3)), std::string::npos) << r.err;
+    std::string input = firstRow + "\n";
+    for (const auto& badRow : badRows) input += badRow.second + "\n";
+    input += rows.substr(firstRow.size() + 1);
+
+    for (const bool json : {false, true}) {
+      SCOPED_TRACE(std::string(verb.args) + (json ? " --json" : ""));
+      std::vector<std::string> args = argsOf(verb);
+      if (json) args.insert(args.begin(), "--json");
+      // What bad rows leave: the clean output, or for a figure the output of no rows at all.
+      const SvyResult clean = runSvy(args, verb.oneFigure ? "" : verb.rows);
+      const SvyResult r = runSvy(args, input);
+      EXPECT_EQ(r.exitStatus, 1);
+      EXPECT_EQ(r.out, clean.out);
+      const std::vector<std::string> messages = r.errLines();
+      ASSERT_EQ(messages.size(), badRows.size() + (verb.oneFigure ? 1 : 0)) << r.err;
+      for (std::size_t k = 0; k < badRows.size(); ++k) {
+        SCOPED_TRACE(badRows[k].first);
+        EXPECT_EQ(messages[k].rfind("svy: line " + std::to_string(k + 2) + ": ", 0), 0u) << messages[k];
+        EXPECT_LT(messages[k].size(), 200u);
+        EXPECT_EQ(messages[k].find_first_of(std::string("\0\r\x1b", 3)), std::string::npos) << messages[k];
       }
     }
   }
