@@ -9,6 +9,7 @@
 #include "svymath/cogo/cogo_intersections.h"
 #include "svymath/cogo/cogo_inverse.h"
 #include "svymath/cogo/inverse_radiate.h"
+#include "svymath/cogo/view_cone.h"
 
 namespace {
 
@@ -113,5 +114,29 @@ void BM_InverseToPolyline(benchmark::State& state) {
   }
 }
 BENCHMARK(BM_InverseToPolyline)->Arg(16)->Arg(1024);
+
+// A field screen redraws every target each frame: turn it into the observer's frame and project it.
+void BM_ViewProjection(benchmark::State& state) {
+  const std::vector<C2dPos> targets = targetsAround(kStation, 64);
+  svy_math::TViewParams view;
+  view.observer = svy_math::TAbstractPoint3<double>(kStation.north(), kStation.east(), 100.0);
+  view.azimuth = 0.7;
+  view.elevation = 0.05;
+  view.fieldOfView = 1.2;
+  view.screenWidth = 1920;
+  view.screenHeight = 1080;
+  const svy_math::TRectCone cone(view);
+  std::size_t i = 0;
+  for (auto _ : state) {
+    const C2dPos& t = targets[i++ & 63u];
+    const svy_math::T3dPosAndDirRotated target(view, svy_math::TAbstractPoint3<double>(t.north(), t.east(), 102.0));
+    double x = 0.0;
+    double y = 0.0;
+    benchmark::DoNotOptimize(cone.toScreen(target, x, y));
+    benchmark::DoNotOptimize(x);
+    benchmark::DoNotOptimize(y);
+  }
+}
+BENCHMARK(BM_ViewProjection);
 
 }  // namespace

@@ -4,8 +4,7 @@
 #include <cstddef>
 #include <vector>
 
-#include "svymath/adjustment/matrix_storage.h"
-#include "svymath/adjustment/spd_inverse.h"
+#include "svymath/adjustment/normal_equations.h"
 #include "svymath/foundation/constants.h"
 #include "svyutils/svy_err_log.h"
 
@@ -19,17 +18,6 @@ constexpr int kLogNoConvergenceCriteria = 76;
 // scaled problem; the second only confirms it.
 constexpr int kRefinementSteps = 2;
 
-bool allFinite(const TLsqMatrix& m) {
-  for (std::size_t i = 0; i < m.size1(); ++i)
-    for (std::size_t j = 0; j < m.size2(); ++j)
-      if (!std::isfinite(m(i, j))) return false;
-  return true;
-}
-
-int packedIndex(std::size_t i, std::size_t j) {
-  return LOC1(static_cast<int>(i) + 1, static_cast<int>(j) + 1, 0, 0, kStorageSymmetric) - 1;
-}
-
 // x = ninv * (atw * y) for the packed inverse ninv of the normal matrix.
 std::vector<double> normalSolve(const std::vector<double>& ninv, const TLsqMatrix& atw, const std::vector<double>& y) {
   const std::size_t n = atw.size1();
@@ -38,7 +26,7 @@ std::vector<double> normalSolve(const std::vector<double>& ninv, const TLsqMatri
     for (std::size_t k = 0; k < atw.size2(); ++k) rhs[i] += atw(i, k) * y[k];
   std::vector<double> x(n, 0.0);
   for (std::size_t i = 0; i < n; ++i)
-    for (std::size_t j = 0; j < n; ++j) x[i] += ninv[static_cast<std::size_t>(packedIndex(i, j))] * rhs[j];
+    for (std::size_t j = 0; j < n; ++j) x[i] += ninv[detail::packedIndex(i, j)] * rhs[j];
   return x;
 }
 
@@ -113,28 +101,14 @@ ELeastSquaresStatus leastSquares(svy_vector<double>& solution, const TLeastSquar
   if (a.size1() != y.size1() || y.size2() != 1) return eLsqDimensionMismatch;
   if (a.size1() < a.size2()) return eLsqTooFewObservations;
   const TLsqMatrix w = data.getWeightMatrix();
-  if (w.size1() != a.size1() || w.size2() != a.size1()) return eLsqDimensionMismatch;
-  if (!allFinite(a) || !allFinite(y) || !allFinite(w)) return eLsqNotFinite;
+  const ELeastSquaresStatus weights = detail::checkWeightsAndValues(a, y, w);
+  if (weights != eLsqOk) return weights;
 
   const std::size_t m = a.size1();
   const std::size_t n = a.size2();
-  // A^T W, skipping the zero weights (W is mostly diagonal).
-  TLsqMatrix atw(n, m, 0.0);
-  for (std::size_t k = 0; k < m; ++k)
-    for (std::size_t l = 0; l < m; ++l) {
-      const double weight = w(k, l);
-      if (weight == 0.0) continue;
-      for (std::size_t i = 0; i < n; ++i) atw(i, l) += a(k, i) * weight;
-    }
-  std::vector<double> normalInverse(n * (n + 1) / 2, 0.0);
-  for (std::size_t i = 0; i < n; ++i)
-    for (std::size_t j = 0; j <= i; ++j) {
-      double sum = 0.0;
-      for (std::size_t k = 0; k < m; ++k) sum += atw(i, k) * a(k, j);
-      normalInverse[static_cast<std::size_t>(packedIndex(i, j))] = sum;
-    }
-  if (!detail::invertPositiveDefinitePacked(normalInverse.data(), static_cast<int>(n), tol::kPivotRelativeZero))
-    return eLsqSingular;
+  const TLsqMatrix atw = detail::weightedTranspose(a, w);
+  std::vector<double> normalInverse;
+  if (!detail::invertNormalMatrix(atw, a, normalInverse)) return eLsqSingular;
 
   std::vector<double> observations(m);
   for (std::size_t k = 0; k < m; ++k) observations[k] = y(k, 0);

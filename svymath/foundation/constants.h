@@ -310,4 +310,14 @@ constexpr double kUndefinedArcRadius = 1e-6;
 
 }  // namespace tol
 
+// Views of targets on a field screen.
+namespace tol {
+
+// A direction on the edge of a viewing cone, computed through sines and cosines of the view angles, lands
+// within a few units in the last place of the edge; directions within this fraction of the edge tangent
+// beyond it count as inside.
+constexpr double kViewConeEdge = 1e-12;
+
+}  // namespace tol
+
 }  // namespace svy_math

@@ -8,6 +8,7 @@
 #include "svymath/adjustment/best_fit.h"
 #include "svymath/adjustment/fit_quality.h"
 #include "svymath/adjustment/least_squares.h"
+#include "svymath/adjustment/lsq_matrix_helpers.h"
 #include "svymath/foundation/constants.h"
 #include "svyutils/svy_err_log.h"
 
@@ -343,6 +344,116 @@ TEST(FitQuality, RmsGradesAndUndefinedTriads) {
   EXPECT_TRUE(!partial.IsUndef() && partial.IsPartialUndef());
   const svy_math::TAbstractPoint3<double> defined(1.0, 2.0, 3.0);
   EXPECT_FALSE(svy_math::DefTriad::IsUndef(defined) || svy_math::DefTriad::IsPartialUndef(defined));
+}
+
+// The covariance of a straight-line fit against the textbook formulas of simple regression
+// (var m = s^2/Sxx, var b = s^2 (1/n + mean^2/Sxx), cov = -mean s^2/Sxx, s^2 = sum v^2 / (n - 2)), and of a
+// weighted mean (sigma0^2 / sum w); scaling the weights leaves the covariance as it was.
+TEST(ComputeCovMatrix, MatchesClosedFormsOfSmallAdjustments) {
+  const double xs[6] = {0, 1, 2, 3, 4, 6}, ys[6] = {1.02, 2.98, 5.05, 6.96, 9.01, 12.97};
+  TLsqMatrix a(6, 2), y(6, 1);
+  double mean = 0.0;
+  for (std::size_t i = 0; i < 6; ++i) a(i, 0) = xs[i], a(i, 1) = 1.0, y(i, 0) = ys[i], mean += xs[i] / 6;
+  const TMatrixData line(a, y, identity(6));
+  svy_vector<double> solution;
+  ASSERT_EQ(svy_math::leastSquares(solution, line), svy_math::eLsqOk);
+  double sxx = 0.0, vv = 0.0;
+  for (std::size_t i = 0; i < 6; ++i) {
+    sxx += (xs[i] - mean) * (xs[i] - mean);
+    vv += std::pow(solution[0] * xs[i] + solution[1] - ys[i], 2);
+  }
+  const double s2 = vv / 4;
+  TLsqMatrix cov;
+  double sigma0Sq = 0.0;
+  ASSERT_EQ(svy_math::ComputeCovMatrix(line, solution, cov, sigma0Sq), svy_math::eLsqOk);
+  EXPECT_NEAR(sigma0Sq, s2, 1e-15);
+  const double expected[2][2] = {{s2 / sxx, -mean * s2 / sxx}, {-mean * s2 / sxx, s2 * (1.0 / 6 + mean * mean / sxx)}};
+  for (std::size_t i = 0; i < 2; ++i)
+    for (std::size_t j = 0; j < 2; ++j) EXPECT_NEAR(cov(i, j), expected[i][j], 1e-15) << i << j;
+
+  const double values[4] = {10.02, 10.05, 9.98, 10.00}, weights[4] = {1.0, 4.0, 0.25, 2.0};
+  for (double scale : {1.0, 4.0}) {
+    TLsqMatrix v(4, 1), w(4, 4, 0.0);
+    const double mean4 = (10.02 + 4 * 10.05 + 0.25 * 9.98 + 2 * 10.00) / 7.25;
+    double wvv = 0.0;
+    for (std::size_t i = 0; i < 4; ++i) {
+      w(i, i) = scale * weights[i], v(i, 0) = mean4 - values[i];
+      wvv += weights[i] * v(i, 0) * v(i, 0);
+    }
+    ASSERT_EQ(svy_math::ComputeCovMatrix(TLsqMatrix(4, 1, 1.0), w, v, cov, sigma0Sq), svy_math::eLsqOk);
+    EXPECT_NEAR(cov(0, 0), wvv / 3 / 7.25, 1e-18) << scale;
+    EXPECT_NEAR(sigma0Sq, scale * wvv / 3, 1e-16) << scale;
+  }
+}
+
+TEST(ComputeCovMatrix, ReportsWhyNoCovarianceLeavingOutputsAlone) {
+  const struct {
+    const char* name;
+    TLsqMatrix a, w, v;
+    ELeastSquaresStatus expected;
+  } cases[] = {
+      {"no redundancy", matrix(2, 2, {1, 0, 0, 1}), identity(2), TLsqMatrix(2, 1, 0.0), svy_math::eLsqTooFewObservations},
+      {"residual rows", matrix(3, 1, {1, 1, 1}), identity(3), TLsqMatrix(2, 1, 0.0), svy_math::eLsqDimensionMismatch},
+      {"weights size", matrix(3, 1, {1, 1, 1}), identity(2), TLsqMatrix(3, 1, 0.0), svy_math::eLsqDimensionMismatch},
+      {"NaN residual", matrix(3, 1, {1, 1, 1}), identity(3), matrix(3, 1, {0, std::nan(""), 0}), svy_math::eLsqNotFinite},
+      {"equal columns", matrix(3, 2, {1, 1, 2, 2, 3, 3}), identity(3), TLsqMatrix(3, 1, 0.0), svy_math::eLsqSingular}};
+  for (const auto& c : cases) {
+    TLsqMatrix cov(1, 1, 7.0);
+    double sigma0Sq = 7.0;
+    EXPECT_EQ(svy_math::ComputeCovMatrix(c.a, c.w, c.v, cov, sigma0Sq), c.expected) << c.name;
+    EXPECT_TRUE(cov.size1() == 1 && cov(0, 0) == 7.0 && sigma0Sq == 7.0) << c.name;
+  }
+}
+
+// Distances from an unknown point near N 5 000 000 to four stations: the numerical design matrix equals the
+// analytic one (the direction cosines), and Gauss-Newton with it reaches the point the distances came from.
+TEST(GenerateATMatrix, DistanceEquationsMatchDirectionCosinesAndAdjust) {
+  const double stations[4][2] = {{5000000.0, 500000.0}, {5000300.0, 500050.0}, {4999900.0, 500400.0}, {5000250.0, 500380.0}};
+  const double truth[2] = {5000120.25, 500210.75};
+  const svy_math::TObservationEquation distance = [&](std::size_t i, const svy_vector<double>& x) {
+    return std::hypot(x[0] - stations[i][0], x[1] - stations[i][1]);
+  };
+  svy_vector<double> point{truth[0] + 3.0, truth[1] - 2.0};
+  const svy_vector<double> steps{1e-4, 1e-4};
+  TLsqMatrix a;
+  for (int iteration = 0; iteration < 6; ++iteration) {
+    ASSERT_TRUE(svy_math::GenerateATMatrix(distance, 4, point, steps, a));
+    TLsqMatrix misclosure(4, 1);
+    for (std::size_t i = 0; i < 4; ++i) {
+      const double d = distance(i, point);
+      EXPECT_NEAR(a(i, 0), (point[0] - stations[i][0]) / d, 1e-8);
+      EXPECT_NEAR(a(i, 1), (point[1] - stations[i][1]) / d, 1e-8);
+      misclosure(i, 0) = std::hypot(truth[0] - stations[i][0], truth[1] - stations[i][1]) - d;
+    }
+    svy_vector<double> correction;
+    ASSERT_EQ(svy_math::leastSquares(correction, TMatrixData(a, misclosure, identity(4))), svy_math::eLsqOk);
+    point[0] += correction[0], point[1] += correction[1];
+  }
+  EXPECT_NEAR(point[0], truth[0], 1e-8);
+  EXPECT_NEAR(point[1], truth[1], 1e-8);
+
+  TLsqMatrix untouched(1, 1, 7.0);
+  const svy_math::TObservationEquation infinite = [](std::size_t, const svy_vector<double>&) { return HUGE_VAL; };
+  EXPECT_FALSE(svy_math::GenerateATMatrix(infinite, 4, point, steps, untouched));
+  EXPECT_FALSE(svy_math::GenerateATMatrix(distance, 0, point, steps, untouched));
+  EXPECT_FALSE(svy_math::GenerateATMatrix(distance, 4, point, svy_vector<double>{1e-4}, untouched));
+  EXPECT_FALSE(svy_math::GenerateATMatrix(distance, 4, point, svy_vector<double>{1e-4, 0.0}, untouched));
+  EXPECT_EQ(untouched(0, 0), 7.0);
+}
+
+// (A B)^T = B^T A^T; a product may overwrite its operand; shapes that do not chain are refused.
+TEST(ProdMat, TransposeOfProductAndAliasing) {
+  const TLsqMatrix a = matrix(2, 3, {1, 2, 3, 4, 5, 6}), b = matrix(3, 2, {7, -1, 0.5, 2, -3, 4});
+  TLsqMatrix ab, btat, aliased = a;
+  ASSERT_TRUE(svy_math::ProdMat(a, b, ab));
+  ASSERT_TRUE(svy_math::ProdMat(svy_math::GenerateTransposeMatrix(b), svy_math::GenerateTransposeMatrix(a), btat));
+  ASSERT_TRUE(svy_math::ProdMat(aliased, b, aliased));
+  EXPECT_EQ(ab(0, 0), 7 + 1 - 9);
+  EXPECT_EQ(ab(1, 1), -4 + 10 + 24);
+  for (std::size_t i = 0; i < 2; ++i)
+    for (std::size_t j = 0; j < 2; ++j) EXPECT_TRUE(btat(j, i) == ab(i, j) && aliased(i, j) == ab(i, j));
+  EXPECT_FALSE(svy_math::ProdMat(a, a, ab));
+  EXPECT_EQ(ab.size1(), 2u);
 }
 
 }  // namespace

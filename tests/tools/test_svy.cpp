@@ -115,7 +115,7 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
   }
   const SvyResult help = runSvy({"--help"});
   EXPECT_EQ(help.exitStatus, 0);
-  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "traverse"}) {
+  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "traverse", "view"}) {
     EXPECT_NE(help.out.find(family), std::string::npos) << family;
   }
 }
@@ -141,15 +141,43 @@ TEST(AngleConvert, KnownValuesQuirksAndRoundTrips) {
   EXPECT_EQ(runSvy({"angle", "convert", "--from", "deg", "--to", "dms"}, "12.9999999\n13.0\n").out,
             "value\n12.59599996\n13.00000000\n");
   const double degrees[] = {0.5, 123.456789, -45.25, 359.9999};
-  for (const char* unit : {"rad", "grad", "mil", "dms"}) {
+  for (const char* unit : {"rad", "grad", "mil", "dms", "dmm", "deg-text", "dms-text", "dmm-text"}) {
     const std::string there = runSvy({"--full-precision", "angle", "convert", "--from", "deg", "--to", unit},
                                      "0.5\n123.456789\n-45.25\n359.9999\n")
                                   .out;
     const nlohmann::json back = runJson({"angle", "convert", "--from", unit, "--to", "deg"}, there);
-    ASSERT_EQ(back.size(), 4u) << unit;
+    ASSERT_EQ(back.size(), 4u) << unit << '\n' << there;
     // The packed form keeps seconds to 8 decimals (3e-12 degree).
     for (std::size_t i = 0; i < 4; ++i) EXPECT_NEAR(back[i]["value"].get<double>(), degrees[i], 1e-11) << unit;
   }
+}
+
+// The text forms and the packed DD.MMmm number: known texts and a bad row among good ones (their round
+// trips are in KnownValuesQuirksAndRoundTrips).
+TEST(AngleConvert, TextFormsAndPackedMinutes) {
+  EXPECT_EQ(runSvy({"angle", "convert", "--from", "deg", "--to", "dms-text"}, "45.50423611111111\n-0.5\n").out,
+            "value\n\"45\u00B030'15.2500\"\"\"\n\"-0\u00B030'00.0000\"\"\"\n");
+  EXPECT_EQ(runSvy({"angle", "convert", "--from", "deg", "--to", "deg-text"}, "12.5\n").out, "value\n12.5\u00B0\n");
+  EXPECT_EQ(runSvy({"angle", "convert", "--from", "deg", "--to", "dmm"}, "-12.0833333333333333\n").out,
+            "value\n-12.05000000\n");
+  const SvyResult mixed = runSvy({"angle", "convert", "--from", "dmm", "--to", "deg"}, "45.30254\n45.60\n7.3\n");
+  EXPECT_EQ(mixed.exitStatus, 1);
+  EXPECT_EQ(mixed.out, "value\n45.504233333\n7.500000000\n");
+  EXPECT_EQ(mixed.err, "svy: line 2: value: '45.60' is not a dmm angle\n");
+}
+
+// svy view project: a 90 degree view on 800 x 600 pixels puts a target 45 degrees right on the right edge
+// and one 0.76 up at 1 ahead above the top; behind the observer there is no position; a bad view is a usage
+// error.
+TEST(ViewProject, KnownPixelsBehindAndBadViews) {
+  const std::vector<std::string> view = {"view", "project", "--observer", "5000000,500000,100", "--azimuth", "90",
+                                         "--fov", "90", "--screen", "800,600"};
+  const SvyResult r = runSvy(view, "n,e,h\n5000000,500100,100\n4999900,500100,100\n5000000,500100,176\n5000000,499900,100\n");
+  EXPECT_EQ(r.exitStatus, 0) << r.err;
+  EXPECT_EQ(r.out, "x,y,inside\n400.00,300.00,1\n800.00,300.00,1\n400.00,-4.00,0\nnan,nan,0\n");
+  std::vector<std::string> bad = view;
+  bad[7] = "180";
+  EXPECT_EQ(runSvy(bad, "").exitStatus, 2);
 }
 
 // svy units convert: published unit definitions, the deliberate asymmetries of the factors, and round trips.

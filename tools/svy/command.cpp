@@ -30,6 +30,7 @@ int runCommand(int argc, const char* const* argv) {
     registerLocalizeVerbs(app);
     registerResectVerbs(app);
     registerTraverseVerbs(app);
+    registerViewVerbs(app);
 
     try {
       app.parse(argc, argv);

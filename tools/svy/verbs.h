@@ -23,3 +23,5 @@ void registerLocalizeVerbs(CLI::App& app);
 void registerResectVerbs(CLI::App& app);
 // "svy traverse": adjustment of a traverse between known points (compass and transit rules).
 void registerTraverseVerbs(CLI::App& app);
+// "svy view": screen positions of targets seen from an observer.
+void registerViewVerbs(CLI::App& app);
