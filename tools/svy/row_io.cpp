@@ -331,6 +331,13 @@ bool checkRow(const RowFormat& format, InputRow& row, std::string& error) {
     error = "a double quote is not closed";
     return false;
   }
+  // The library reads text up to a NUL byte: "12\0x" would pass as "12".
+  for (const std::string& field : row.fields) {
+    if (field.find('\0') != std::string::npos) {
+      error = "a field holds a NUL byte";
+      return false;
+    }
+  }
   if (!fieldCountFits(format, row.fields.size())) {
     error = fieldCountMessage(format, row.fields.size());
     return false;
