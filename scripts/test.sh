@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
 # Builds and runs the whole test suite twice: a normal debug build, then an AddressSanitizer +
-# UndefinedBehaviorSanitizer build; then runs every fuzz target briefly on its corpus. Fails when a build,
+# UndefinedBehaviorSanitizer build; then the concurrency tests alone under ThreadSanitizer (only the test
+# executables that hold them are built); then every fuzz target briefly on its corpus. Fails when a build,
 # a test or a fuzz target fails, and when a test skips for any reason but absent reference data.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
@@ -40,8 +41,14 @@ for preset in dev asan; do
   svy_report_skips "build/${preset}/ctest-junit.xml"
 done
 
+# Concurrency tests are named *Concurrency.*; their executables are listed here.
+echo "=== tsan: configure, build and run the concurrency tests"
+cmake --preset tsan
+cmake --build --preset tsan -j"${jobs}" --target test_alignments
+ctest --preset tsan -j"${jobs}" -R 'Concurrency\.'
+
 echo "=== fuzz: build, then ${fuzz_seconds} s per target on its corpus"
 cmake --preset fuzz
 cmake --build --preset fuzz -j"${jobs}"
 bash fuzz/run.sh "${fuzz_seconds}"
-echo "=== all tests passed in both builds; no fuzz target found anything"
+echo "=== all tests passed in all builds; no fuzz target found anything"

@@ -320,4 +320,89 @@ constexpr double kViewConeEdge = 1e-12;
 
 }  // namespace tol
 
+// Alignments.
+namespace tol {
+
+// Two alignment elements are equal (isEqual) when their lengths and radii agree within this (metres) and
+// their fixed start azimuths within this (radians): far below survey precision, above the rounding of
+// values computed from the same input in a different order.
+constexpr double kElementEqual = 1e-9;
+// The batch point-to-chainage search grows each element's plan box by this (metres) in its spatial index:
+// an element accepts the foot of a point up to tol::kSnap beyond its ends, so an element whose box lies
+// farther than the margin minus that snap from the point cannot offer it a smaller offset.
+constexpr double kSearchIndexMargin = 2.0 * kSnap;
+// An intersection-point element whose previous ST lies beyond its TS by no more than this (metres) still
+// counts as touching it: ST and TS come from different IPs at survey coordinates, where a double resolves
+// about 1e-9 m and each is off by a few such spacings.
+constexpr double kIpTangentOverlap = 1e-8;
+// First search radius (metres) beyond the nearest element box: the radius then doubles until no element
+// outside it can change the answer.
+constexpr double kSearchStartRadius = 1.0;
+// Doublings of the search radius before the search falls back to all elements (2^64 m exceeds any plan).
+constexpr int kSearchRadiusDoublings = 64;
+
+}  // namespace tol
+
+// Vertical alignments (profiles).
+namespace units {
+
+// Grades are percent: a grade g rises g / kPercent metres per metre of chainage.
+constexpr double kPercent = 100.0;
+
+}  // namespace units
+
+namespace limits {
+
+// Regular stations one chainage iteration yields at most: a million (20 MB of points) covers 10 000 km at
+// 10 m; an absurd interval or range ends the stations there instead of exhausting memory.
+constexpr double kMaxChainageStations = 1.0e6;
+
+}  // namespace limits
+
+}  // namespace svy_math
+
+// Areas bounded by lines and arcs, and their subdivision by a known area.
+namespace svy_math {
+namespace tol {
+
+// Two boundary coordinates are the same vertex when north and east agree within this (metres): a closing
+// line is added to a point list only beyond it, and two arcs share a centre within it.
+constexpr double kAreaSameVertex = 2e-09;
+// Heights of two arc centres agree within this (metres) for the centres to be the same.
+constexpr double kAreaSameHeight = 0.0001;
+// A single arc is a whole circle when its length is 2 pi r within this (metres).
+constexpr double kAreaFullCircle = 0.0001;
+// Two arcs of a two-segment boundary meet end to start within this (metres).
+constexpr double kAreaArcsMeet = 0.0001;
+// A circular segment or a boundary area within this of zero (square metres) is logged as suspicious.
+constexpr double kAreaNearZero = 1e-10;
+// Two radii of arcs on one circle agree within this (metres): the double epsilon, i.e. equal radii.
+constexpr double kAreaSameRadius = 2.220446049250313e-16;
+// Points of cuts and crossings are the same, and a point lies on a segment, within this (metres): a
+// thousandth of a millimetre, far below survey precision and far above the rounding of coordinates at
+// N 5 000 000 after a few operations.
+constexpr double kAreaPoint = 1e-06;
+// A piece's area is accepted within this of the requested area (square metres).
+constexpr double kSubdivisionArea = 0.001;
+// Two successive trials whose areas differ by less than this (square metres) mean the search has stalled.
+constexpr double kSubdivisionStall = 0.0001;
+// A hinge point of a subdivision lies on the boundary within this (metres): a corner typed to the millimetre
+// is found; the hinge is then moved onto the boundary.
+constexpr double kHingeOnBoundary = 0.001;
+// Starting values of the extent of a boundary in the frame of a cut direction (metres): any coordinate
+// replaces them.
+constexpr double kExtentStartMax = 1e-40;
+constexpr double kExtentStartMin = 1e+40;
+// Starting value of the smallest distance of a boundary point from the base line of a cut (metres).
+constexpr double kCutDistanceStart = 100000.0;
+
+}  // namespace tol
+
+namespace limits {
+
+// Probing levels of the bracketing search after values that cannot be evaluated: level k tries 2k values,
+// so 100 levels try ~10 000, with a step of 2^-101 of the bracket, beyond double precision.
+constexpr int kSearchProbeLevels = 100;
+
+}  // namespace limits
 }  // namespace svy_math

@@ -31,6 +31,7 @@ int runCommand(int argc, const char* const* argv) {
     registerResectVerbs(app);
     registerTraverseVerbs(app);
     registerViewVerbs(app);
+    registerAreaVerbs(app);
 
     try {
       app.parse(argc, argv);
