@@ -360,3 +360,14 @@ constexpr double kMaxChainageStations = 1.0e6;
 }  // namespace limits
 
 }  // namespace svy_math
+
+// Road cross-sections and slopes.
+namespace svy_math {
+namespace tol {
+
+// Rise over run reported between two section points at the same offset (a vertical face such as a kerb
+// face given by two points): a finite stand-in for an infinite slope, signed by the rise.
+constexpr double kVerticalSlopeRatio = 1.0e6;
+
+}  // namespace tol
+}  // namespace svy_math

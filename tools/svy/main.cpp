@@ -26,6 +26,7 @@ int main(int argc, char** argv) {
   registerProfileVerbs(app);
   registerLocalizeVerbs(app);
   registerResectVerbs(app);
+  registerRoadVerbs(app);
   registerTraverseVerbs(app);
   registerViewVerbs(app);
 

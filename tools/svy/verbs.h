@@ -23,6 +23,8 @@ void registerProfileVerbs(CLI::App& app);
 void registerLocalizeVerbs(CLI::App& app);
 // "svy resect": free-station resection.
 void registerResectVerbs(CLI::App& app);
+// "svy road": catch points of cut and fill slopes (slope staking).
+void registerRoadVerbs(CLI::App& app);
 // "svy traverse": adjustment of a traverse between known points (compass and transit rules).
 void registerTraverseVerbs(CLI::App& app);
 // "svy view": screen positions of targets seen from an observer.
