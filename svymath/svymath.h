@@ -109,6 +109,7 @@
 #include "svymath/alignments/alnt_v.h"
 #include "svymath/alignments/alnt_pair.h"
 #include "svymath/alignments/chainage_iterator.h"
+#include "svymath/alignments/pos_cache.h"
 #include "svymath/road/cross_section_point.h"
 #include "svymath/road/cross_section.h"
 #include "svymath/road/cross_section_slope.h"

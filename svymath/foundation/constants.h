@@ -371,3 +371,22 @@ constexpr double kVerticalSlopeRatio = 1.0e6;
 
 }  // namespace tol
 }  // namespace svy_math
+
+// Position caches of alignments.
+namespace svy_math {
+namespace limits {
+
+// Positions one cache holds at most: a million (32 MB) covers 10 km at one position per centimetre. A
+// deviation so small that sampling would need more ends the build with a failure instead of exhausting memory.
+constexpr double kMaxCachePositions = 1.0e6;
+
+}  // namespace limits
+
+namespace tol {
+
+// The smallest chord deviation a position cache samples for (metres): a micrometre is far below any drawing or
+// stake-out tolerance, and smaller ones only spend time before running into limits::kMaxCachePositions.
+constexpr double kMinCacheDeviation = 1e-6;
+
+}  // namespace tol
+}  // namespace svy_math
