@@ -119,3 +119,7 @@
 #include "svymath/road/road_string.h"
 #include "svymath/road/road_base.h"
 #include "svymath/road/road_base_impl.h"
+#include "svymath/road/offset_plane.h"
+#include "svymath/road/offset_points.h"
+#include "svymath/road/offset_stations.h"
+#include "svymath/road/offset_ts.h"

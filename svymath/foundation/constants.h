@@ -390,3 +390,28 @@ constexpr double kMinCacheDeviation = 1e-6;
 
 }  // namespace tol
 }  // namespace svy_math
+
+// Offset curves and offset alignments.
+namespace svy_math {
+namespace tol {
+
+// Newton's method from a length along an offset curve back to the element's length stops when the step is
+// below this (metres): a hundredth of the nanometre the offset-curve queries answer to.
+constexpr double kOffsetLengthConvergence = 1e-11;
+
+// The chord deviation (metres) at which an element is probed for its largest curvature when an offset is
+// checked against the centres of curvature: the probes land in every arc of a curve group.
+constexpr double kOffsetCurvatureProbe = 0.01;
+
+}  // namespace tol
+
+namespace limits {
+
+// Newton steps for an offset-curve length: it converges in a handful; the bound only ends absurd input.
+constexpr int kOffsetLengthIterations = 60;
+// Curvature probes along one element: enough for a 100 km element at the probe deviation; the bound only
+// ends absurd input.
+constexpr int kOffsetCurvatureProbes = 100000;
+
+}  // namespace limits
+}  // namespace svy_math
