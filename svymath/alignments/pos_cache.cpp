@@ -11,6 +11,7 @@
 #include "svymath/alignments/pos_cache_log.h"
 #include "svymath/alignments/vertical_element_base.h"
 #include "svymath/foundation/constants.h"
+#include "svymath/foundation/math_angle.h"
 #include "svyutils/svy_err_log.h"
 
 SVY_RTTI_DEFINE(CAlntPosCacheBase, CRttiBase)
@@ -22,17 +23,16 @@ namespace {
 
 using svy_math::tol::kZero;
 
-// FNV-1a over the bit patterns of the values: equal geometry gives an equal fingerprint.
+// A multiplicative hash over the bit patterns of the values, a word at a time: equal geometry gives an equal
+// fingerprint, and any change of a value changes it but for a 2^-64 chance.
 constexpr std::uint64_t kFingerprintSeed = 14695981039346656037ull;
 constexpr std::uint64_t kFingerprintPrime = 1099511628211ull;
 
 void mix(std::uint64_t& hash, double value) {
   std::uint64_t bits = 0;
   std::memcpy(&bits, &value, sizeof bits);
-  for (int byte = 0; byte < 8; ++byte) {
-    hash ^= (bits >> (8 * byte)) & 0xffu;
-    hash *= kFingerprintPrime;
-  }
+  hash = (hash ^ bits) * kFingerprintPrime;
+  hash ^= hash >> 29;
 }
 
 TAlntCachePos undefinedPos(double chainage, bool atJoint) {
@@ -93,6 +93,8 @@ bool sampleProfile(const CVertAlntBase& profile, double deviation, std::vector<T
   return !out.empty();
 }
 
+// An element's shape follows from its kind, start, start direction, length and end curvatures (a spiral's law
+// is linear in curvature between them): these are cheap to read, where a spiral's end position is not.
 void mixHorizontal(const CHorzAlntBase& alignment, std::uint64_t& hash) {
   mix(hash, alignment.getNumOfElements());
   mix(hash, alignment.getStartChainageInM());
@@ -100,10 +102,13 @@ void mixHorizontal(const CHorzAlntBase& alignment, std::uint64_t& hash) {
   mix(hash, alignment.getStartPosE());
   for (int i = 0; i < alignment.getNumOfElements(); ++i) {
     const auto* element = static_cast<const CHorzAlntElemBase*>(alignment.getElement(i));
-    double start = 0.0, length = 0.0, north = 0.0, east = 0.0;
+    double start = 0.0, length = 0.0, north = 0.0, east = 0.0, k0 = 0.0, k1 = 0.0;
+    CMathAngle azimuth;
     const bool known = element->getStartChainageInM(start) && element->getHLengthInM(length) &&
-                       element->getFinalPosNe(north, east);
-    for (double value : {static_cast<double>(element->getType()), known ? 1.0 : 0.0, start, length, north, east}) {
+                       element->getStartPosNe(north, east) && element->getStartAzimut(azimuth) &&
+                       element->getCurvatureAtLength(0.0, k0) && element->getCurvatureAtLength(length, k1);
+    for (double value : {static_cast<double>(element->getType()), known ? 1.0 : 0.0, start, length, north, east,
+                         azimuth.getRad(), k0, k1}) {
       mix(hash, value);
     }
   }
