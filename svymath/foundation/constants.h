@@ -310,6 +310,16 @@ constexpr double kUndefinedArcRadius = 1e-6;
 
 }  // namespace tol
 
+// Views of targets on a field screen.
+namespace tol {
+
+// A direction on the edge of a viewing cone, computed through sines and cosines of the view angles, lands
+// within a few units in the last place of the edge; directions within this fraction of the edge tangent
+// beyond it count as inside.
+constexpr double kViewConeEdge = 1e-12;
+
+}  // namespace tol
+
 // Alignments.
 namespace tol {
 
@@ -333,16 +343,6 @@ constexpr int kSearchRadiusDoublings = 64;
 
 }  // namespace tol
 
-// Views of targets on a field screen.
-namespace tol {
-
-// A direction on the edge of a viewing cone, computed through sines and cosines of the view angles, lands
-// within a few units in the last place of the edge; directions within this fraction of the edge tangent
-// beyond it count as inside.
-constexpr double kViewConeEdge = 1e-12;
-
-}  // namespace tol
-
 // Vertical alignments (profiles).
 namespace units {
 
@@ -359,6 +359,52 @@ constexpr double kMaxChainageStations = 1.0e6;
 
 }  // namespace limits
 
+}  // namespace svy_math
+
+// Areas bounded by lines and arcs, and their subdivision by a known area.
+namespace svy_math {
+namespace tol {
+
+// Two boundary coordinates are the same vertex when north and east agree within this (metres): a closing
+// line is added to a point list only beyond it, and two arcs share a centre within it.
+constexpr double kAreaSameVertex = 2e-09;
+// Heights of two arc centres agree within this (metres) for the centres to be the same.
+constexpr double kAreaSameHeight = 0.0001;
+// A single arc is a whole circle when its length is 2 pi r within this (metres).
+constexpr double kAreaFullCircle = 0.0001;
+// Two arcs of a two-segment boundary meet end to start within this (metres).
+constexpr double kAreaArcsMeet = 0.0001;
+// A circular segment or a boundary area within this of zero (square metres) is logged as suspicious.
+constexpr double kAreaNearZero = 1e-10;
+// Two radii of arcs on one circle agree within this (metres): the double epsilon, i.e. equal radii.
+constexpr double kAreaSameRadius = 2.220446049250313e-16;
+// Points of cuts and crossings are the same, and a point lies on a segment, within this (metres): a
+// thousandth of a millimetre, far below survey precision and far above the rounding of coordinates at
+// N 5 000 000 after a few operations.
+constexpr double kAreaPoint = 1e-06;
+// A piece's area is accepted within this of the requested area (square metres).
+constexpr double kSubdivisionArea = 0.001;
+// Two successive trials whose areas differ by less than this (square metres) mean the search has stalled.
+constexpr double kSubdivisionStall = 0.0001;
+// A hinge point of a subdivision lies on the boundary within this (metres): a corner typed to the millimetre
+// is found; the hinge is then moved onto the boundary.
+constexpr double kHingeOnBoundary = 0.001;
+// Starting values of the extent of a boundary in the frame of a cut direction (metres): any coordinate
+// replaces them.
+constexpr double kExtentStartMax = 1e-40;
+constexpr double kExtentStartMin = 1e+40;
+// Starting value of the smallest distance of a boundary point from the base line of a cut (metres).
+constexpr double kCutDistanceStart = 100000.0;
+
+}  // namespace tol
+
+namespace limits {
+
+// Probing levels of the bracketing search after values that cannot be evaluated: level k tries 2k values,
+// so 100 levels try ~10 000, with a step of 2^-101 of the bracket, beyond double precision.
+constexpr int kSearchProbeLevels = 100;
+
+}  // namespace limits
 }  // namespace svy_math
 
 // Road cross-sections and slopes.

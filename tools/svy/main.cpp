@@ -29,6 +29,7 @@ int main(int argc, char** argv) {
   registerRoadVerbs(app);
   registerTraverseVerbs(app);
   registerViewVerbs(app);
+  registerAreaVerbs(app);
 
   try {
     app.parse(argc, argv);

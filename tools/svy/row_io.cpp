@@ -144,6 +144,12 @@ std::string formatNumber(double value, int decimals) {
   return text;
 }
 
+double shownValue(double value, int decimals, const OutputOptions& options) {
+  double shown = value;
+  if (!options.fullPrecision && std::isfinite(value)) parseNumber(formatNumber(value, decimals), shown);
+  return shown;
+}
+
 OutputOptions outputOptionsFor(const CLI::App& command) {
   const CLI::App* root = &command;
   while (root->get_parent() != nullptr) root = root->get_parent();
@@ -262,11 +268,8 @@ std::string RowWriter::jsonObject(const std::vector<Column>& columns, const std:
       object[column.name] = *text;
       continue;
     }
-    const double value = std::get<double>(cells[i]);
-    double shown = value;
     // The rounded value, so that JSON and CSV agree; JSON gives it back in its shortest exact form.
-    if (!options_.fullPrecision && std::isfinite(value)) parseNumber(formatNumber(value, column.decimals), shown);
-    object[column.name] = shown;
+    object[column.name] = shownValue(std::get<double>(cells[i]), column.decimals, options_);
   }
   // Text echoed from the input may not be valid UTF-8 (a file in a legacy code page): such bytes are
   // written as U+FFFD instead of failing the whole output.

@@ -94,6 +94,11 @@ bool parseNumber(const std::string& text, double& value);
 // digits; NaN gives "nan" and infinities "inf" / "-inf".
 std::string formatNumber(double value, int decimals);
 
+// The value a number is written as: rounded to the column's decimals (as the CSV shows it), or unchanged
+// under --full-precision or when it is not finite. Verbs that write a JSON document of their own shape use it
+// so that their numbers agree with the CSV.
+double shownValue(double value, int decimals, const OutputOptions& options);
+
 // Reads content lines; see the header rules at the top of this file.
 class RowReader {
  public:

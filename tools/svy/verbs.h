@@ -29,3 +29,5 @@ void registerRoadVerbs(CLI::App& app);
 void registerTraverseVerbs(CLI::App& app);
 // "svy view": screen positions of targets seen from an observer.
 void registerViewVerbs(CLI::App& app);
+// "svy area": area and perimeter of a boundary of lines and arcs, and its subdivision by a known area.
+void registerAreaVerbs(CLI::App& app);
