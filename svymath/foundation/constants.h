@@ -429,3 +429,47 @@ constexpr int kSearchProbeLevels = 100;
 
 }  // namespace limits
 }  // namespace svy_math
+
+// Position caches of alignments.
+namespace svy_math {
+namespace limits {
+
+// Positions one cache holds at most: a million (32 MB) covers 10 km at one position per centimetre. A
+// deviation so small that sampling would need more ends the build with a failure instead of exhausting memory.
+constexpr double kMaxCachePositions = 1.0e6;
+
+}  // namespace limits
+
+namespace tol {
+
+// The smallest chord deviation a position cache samples for (metres): a micrometre is far below any drawing or
+// stake-out tolerance, and smaller ones only spend time before running into limits::kMaxCachePositions.
+constexpr double kMinCacheDeviation = 1e-6;
+
+}  // namespace tol
+}  // namespace svy_math
+
+// Offset curves and offset alignments.
+namespace svy_math {
+namespace tol {
+
+// Newton's method from a length along an offset curve back to the element's length stops when the step is
+// below this (metres): a hundredth of the nanometre the offset-curve queries answer to.
+constexpr double kOffsetLengthConvergence = 1e-11;
+
+// The chord deviation (metres) at which an element is probed for its largest curvature when an offset is
+// checked against the centres of curvature: the probes land in every arc of a curve group.
+constexpr double kOffsetCurvatureProbe = 0.01;
+
+}  // namespace tol
+
+namespace limits {
+
+// Newton steps for an offset-curve length: it converges in a handful; the bound only ends absurd input.
+constexpr int kOffsetLengthIterations = 60;
+// Curvature probes along one element: enough for a 100 km element at the probe deviation; the bound only
+// ends absurd input.
+constexpr int kOffsetCurvatureProbes = 100000;
+
+}  // namespace limits
+}  // namespace svy_math
