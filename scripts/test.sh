@@ -41,10 +41,10 @@ for preset in dev asan; do
   svy_report_skips "build/${preset}/ctest-junit.xml"
 done
 
-# Concurrency tests are named *Concurrency.*; their executables are listed here.
+# Concurrency tests are named *Concurrency.*; the executables that hold them are listed here.
 echo "=== tsan: configure, build and run the concurrency tests"
 cmake --preset tsan
-cmake --build --preset tsan -j"${jobs}" --target test_alignments
+cmake --build --preset tsan -j"${jobs}" --target test_alignments test_road test_area test_geodesy
 ctest --preset tsan -j"${jobs}" -R 'Concurrency\.'
 
 echo "=== fuzz: build, then ${fuzz_seconds} s per target on its corpus"
