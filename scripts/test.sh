@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
 # Builds and runs the whole test suite twice: a normal debug build, then an AddressSanitizer +
-# UndefinedBehaviorSanitizer build. Fails when either build or any test fails.
+# UndefinedBehaviorSanitizer build; then the concurrency tests alone under ThreadSanitizer (only the test
+# executables that hold them are built). Fails when any build or any test fails.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 source scripts/deps.sh
@@ -13,4 +14,9 @@ for preset in dev asan; do
   cmake --build --preset "${preset}" -j"${jobs}"
   ctest --preset "${preset}" -j"${jobs}"
 done
-echo "=== all tests passed in both builds"
+# Concurrency tests are named *Concurrency.*; their executables are listed here.
+echo "=== tsan: configure, build and run the concurrency tests"
+cmake --preset tsan
+cmake --build --preset tsan -j"${jobs}" --target test_alignments
+ctest --preset tsan -j"${jobs}" -R 'Concurrency\.'
+echo "=== all tests passed in all builds"

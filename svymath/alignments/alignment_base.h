@@ -6,7 +6,7 @@
 // other). It serialises the queries that take it (the point-to-chainage searches, which also build the
 // alignment's search index on first use); editing takes no lock, so an alignment must not be edited while
 // another thread reads it. Copying an alignment gives the copy its own, unlocked lock.
-#include <boost/thread/recursive_mutex.hpp>
+#include <memory>
 
 #include "svymath/foundation/class_new.h"
 #include "svymath/foundation/export.h"
@@ -39,8 +39,8 @@ class SVYMATH_API CAlntBase : public virtual CRttiBase {
   bool getEndChainageInM(double& chainage) const { return getFinalChainageInM(chainage); }
 
   // Takes and releases the access lock (recursive); CAlntAccessGuard does both for a scope.
-  void lockAccess() const { m_accessLock.lock(); }
-  void unlockAccess() const { m_accessLock.unlock(); }
+  void lockAccess() const;
+  void unlockAccess() const;
 
  protected:
   CAlntBase();
@@ -49,7 +49,9 @@ class SVYMATH_API CAlntBase : public virtual CRttiBase {
   CAlntBase& operator=(const CAlntBase& other);
 
  private:
-  mutable boost::recursive_mutex m_accessLock;
+  // A boost::recursive_mutex, kept out of this header.
+  class CAccessLock;
+  std::unique_ptr<CAccessLock> m_accessLock;
 };
 
 // Holds an alignment's access lock for the life of the guard.

@@ -11,11 +11,12 @@ using svy_math::tol::kSnap;
 
 SVY_RTTI_DEFINE2(CAlntH, CHorzAlntBase, CAlntBaseImpl)
 
-CAlntH::CAlntH() : m_startNorth(svy_math::undefinedValue()), m_startEast(svy_math::undefinedValue()) {}
+CAlntH::CAlntH()
+    : m_startNorth(svy_math::undefinedValue()), m_startEast(svy_math::undefinedValue()), m_useSearchIndex(true) {}
 
 CAlntH::CAlntH(const CAlntH& other)
     : CRttiBase(), CAlntBase(other), CHorzAlntBase(other), CAlntBaseImpl(other),
-      m_startNorth(other.m_startNorth), m_startEast(other.m_startEast) {
+      m_startNorth(other.m_startNorth), m_startEast(other.m_startEast), m_useSearchIndex(other.m_useSearchIndex) {
   m_elements.reserve(other.m_elements.size());
   for (const CAlntHe* element : other.m_elements) m_elements.push_back(element->clone());
 }
@@ -33,6 +34,7 @@ void CAlntH::copy(const CAlntH& other) {
   CAlntBaseImpl::copy(other);
   m_startNorth = other.m_startNorth;
   m_startEast = other.m_startEast;
+  m_useSearchIndex = other.m_useSearchIndex;
   m_elements.reserve(other.m_elements.size());
   for (const CAlntHe* element : other.m_elements) m_elements.push_back(element->clone());
 }
@@ -75,11 +77,13 @@ bool CAlntH::getFinalChainageInM(double& chainage) const {
 }
 
 bool CAlntH::getFinalPosNe(double& north, double& east) const {
+  CAlntAccessGuard guard(*this);
   const CAlntHe* last = getLastHe();
   return last != nullptr && last->getFinalPosNe(north, east);
 }
 
 C2dMinMax CAlntH::getBoundary() const {
+  CAlntAccessGuard guard(*this);
   C2dMinMax boundary;
   for (const CAlntHe* element : m_elements) boundary.include(element->getBoundary());
   return boundary;
@@ -117,18 +121,21 @@ const CAlntHe* CAlntH::getAlntHeAtChain(double chainage, double* distanceInEleme
 // ---- queries by chainage ----
 
 bool CAlntH::getPosNeAtChain(double chainage, double& north, double& east) const {
+  CAlntAccessGuard guard(*this);
   double distance = 0.0;
   const CAlntHe* element = findHeAtChain(chainage, &distance, nullptr);
   return element != nullptr && element->getPosNeAtLength(distance, north, east);
 }
 
 bool CAlntH::getAzimuthAtChain(double chainage, double& azimuthDeg) const {
+  CAlntAccessGuard guard(*this);
   double distance = 0.0;
   const CAlntHe* element = findHeAtChain(chainage, &distance, nullptr);
   return element != nullptr && element->getAzimuthAtLength(distance, azimuthDeg);
 }
 
 bool CAlntH::getCurvatureAtChainage(double chainage, double& curvature) const {
+  CAlntAccessGuard guard(*this);
   double distance = 0.0;
   const CAlntHe* element = findHeAtChain(chainage, &distance, nullptr);
   return element != nullptr && element->getCurvatureAtLength(distance, curvature);
@@ -154,6 +161,8 @@ double degreesOrZero(const CMathAngle& azimuth) { return azimuth.isNan() ? 0.0 :
 // is laid off square to the tangent (positive right); below tol::kOffsetZero the centre-line point is kept.
 bool CAlntH::getPosNeAtChainAndOffsetExtr(double chainage, double offset, double& north, double& east,
                                           bool* extrapolated) const {
+  CAlntAccessGuard guard(*this);
+  if (std::isnan(chainage) || std::isnan(offset)) return false;
   double finalChainage = 0.0;
   if (!getFinalChainageInM(finalChainage)) return false;
   const double startChainage = getStoredStartChainageInM();
@@ -189,6 +198,8 @@ bool CAlntH::getPosNeAtChainAndOffsetExtr(double chainage, double offset, double
 }
 
 bool CAlntH::getAzimuthAtChainExtr(double chainage, double& azimuthDeg) const {
+  CAlntAccessGuard guard(*this);
+  if (std::isnan(chainage)) return false;
   if (getAzimuthAtChain(chainage, azimuthDeg)) return true;
   double finalChainage = 0.0;
   if (!getFinalChainageInM(finalChainage)) return false;
@@ -201,6 +212,7 @@ bool CAlntH::getAzimuthAtChainExtr(double chainage, double& azimuthDeg) const {
 }
 
 bool CAlntH::getIpPosForElement(int index, double& north, double& east) const {
+  CAlntAccessGuard guard(*this);
   const CAlntHe* element = getHe(index);
   return element != nullptr && element->getIpPos(north, east);
 }
@@ -239,7 +251,6 @@ void CAlntH::doHPostUpdate(int index) {
   for (int j = std::max(index - 1, 0); j < count; ++j) {
     CAlntHe* element = m_elements[static_cast<std::size_t>(j)];
     element->onSetIndex(*this, j);
-    element->warmCaches();
   }
 }
 

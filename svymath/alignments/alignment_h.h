@@ -8,10 +8,13 @@
 // intersection-point element depends on its successor. Between onBulkUpdateStarted and
 // onBulkUpdateFinished edits are not re-anchored (queries see the stale chain); finishing re-anchors all.
 //
-// Access lock (recursive, see CAlntBase): taken by both FindChainageAndOffset forms, the batch query
-// FindChainagesAndOffsets (which also builds the search index under it), and getHLengthInM (it fills the
-// length cache) with everything that reads the length through it. The other queries read only and take no
-// lock. Editing takes no lock: do not edit an alignment while another thread reads it.
+// Access lock (recursive, see CAlntBase): every query of the alignment itself takes it, because the
+// elements fill caches inside their const queries (angles, spiral laws): both FindChainageAndOffset forms,
+// the batch query FindChainagesAndOffsets (which also builds its search index under it), the queries by
+// chainage and their extrapolating forms, FindApproxChainageAndOffset, getHLengthInM and
+// getFinalChainageInM (they fill the length cache), getFinalPosNe, getBoundary, getIpPosForElement and
+// ForEachSegment. An element reached through getHe or getHorzElemAtChain is not guarded: query it from one
+// thread at a time. Editing takes no lock: do not edit an alignment while another thread reads it.
 #include <cstddef>
 #include <memory>
 #include <vector>
@@ -23,7 +26,6 @@
 namespace svy_math {
 namespace detail {
 class CAlntSearchIndex;
-struct TAlntSearchScratch;
 struct TAlntSearchTrace;
 }  // namespace detail
 }  // namespace svy_math
@@ -66,6 +68,9 @@ class SVYMATH_API CAlntH : public virtual CHorzAlntBase, public CAlntBaseImpl {
   C2dMinMax getBoundary() const override;
   bool getPosNeAtChain(double chainage, double& north, double& east) const override;
   bool getAzimuthAtChain(double chainage, double& azimuthDeg) const override;
+  // Both FindChainageAndOffset forms give the answers of the element-by-element search (every element in
+  // order, the tie-break and wedge rules) but take the elements to search from a spatial index of their
+  // boxes, built on first use after an edit: only the elements that could change the answer are projected.
   bool FindChainageAndOffset(double north, double east, double& chainage, double& offset, bool& extrapolated,
                              int* index = nullptr, bool* atJoint = nullptr) const override;
   bool FindChainageAndOffset(double north, double east, double& chainage, double& offset, int* index = nullptr,
@@ -104,12 +109,16 @@ class SVYMATH_API CAlntH : public virtual CHorzAlntBase, public CAlntBaseImpl {
   void removeAllHes();
   void copy(const CAlntH& other);
 
-  // Batch point-to-chainage: results[k] answers (north[k], east[k]) exactly as FindChainageAndOffset would
-  // (the seven-argument form when withExtension is true, else the six-argument form), with candidate
-  // elements taken from a spatial index of the elements' boxes, built on first use after an edit. Returns the
-  // number of points found. Holds the access lock for the whole batch.
+  // Batch point-to-chainage over arrays of `count` points: results[k] answers (north[k], east[k]) exactly as
+  // FindChainageAndOffset would (the seven-argument form when withExtension is true, else the six-argument
+  // form). Returns the number of points found (0 for null arrays). Holds the access lock for the whole batch.
   std::size_t FindChainagesAndOffsets(const double* north, const double* east, std::size_t count,
                                       TAlntStationResult* results, bool withExtension) const;
+  // Whether the point-to-chainage queries take their candidates from the spatial index (the default) or
+  // project every element: the answers are the same. Without the index an alignment that is edited between
+  // single queries saves rebuilding it; with it a query costs about as much at 1000 elements as at 10.
+  void setUseSearchIndex(bool use) { m_useSearchIndex = use; }
+  bool getUseSearchIndex() const { return m_useSearchIndex; }
 
  protected:
   // A heap clone of the element, owned by the caller (null when it cannot be cloned).
@@ -126,9 +135,15 @@ class SVYMATH_API CAlntH : public virtual CHorzAlntBase, public CAlntBaseImpl {
   // The best on-alignment answer over the candidate elements (ascending indices; null: every element).
   bool findOnAlignment(double north, double east, const std::vector<int>* candidates, TAlntStationResult& result,
                        svy_math::detail::TAlntSearchTrace* trace) const;
-  // The six- or seven-argument search of one point through the index.
-  bool findIndexed(double north, double east, bool withExtension, svy_math::detail::TAlntSearchScratch& scratch,
-                   TAlntStationResult& result) const;
+  // The six- or seven-argument search of one point, through the index unless it is switched off. Called
+  // under the access lock.
+  bool findPoint(double north, double east, bool withExtension, TAlntStationResult& result) const;
+  // The on-alignment search over the elements near the point (the index is built first when missing).
+  bool findThroughIndex(double north, double east, TAlntStationResult& result) const;
+  // An element's distance bound and its foot for the point; with `remembered` through the index's record of
+  // what the element answered earlier for the same point.
+  bool elementDistance(int index, double north, double east, bool remembered, double& distance) const;
+  bool elementFoot(int index, double north, double east, bool remembered, double& along, double& offset) const;
   // Step two and three of the seven-argument form: the extensions beyond the two ends.
   bool extendBeyondEnds(double north, double east, bool found, TAlntStationResult& result) const;
   void deleteElements();
@@ -138,5 +153,6 @@ class SVYMATH_API CAlntH : public virtual CHorzAlntBase, public CAlntBaseImpl {
   std::vector<CAlntHe*> m_elements;
   double m_startNorth;
   double m_startEast;
+  bool m_useSearchIndex;
   mutable std::unique_ptr<svy_math::detail::CAlntSearchIndex> m_searchIndex;
 };

@@ -46,13 +46,13 @@ bool CAlntH::findOnAlignment(double north, double east, const std::vector<int>* 
     const int i = candidates != nullptr ? (*candidates)[k] : static_cast<int>(k);
     const CAlntHe* element = m_elements[static_cast<std::size_t>(i)];
     double distance = 0.0;
-    if (best.found && element->getShortestDistanceToPoint(north, east, distance) &&
+    if (best.found && elementDistance(i, north, east, candidates != nullptr, distance) &&
         distance > std::fabs(best.offset) + kSnap) {
       continue;
     }
     double along = 0.0;
     double off = 0.0;
-    if (element->getLengthAndOffset(north, east, along, off)) {
+    if (elementFoot(i, north, east, candidates != nullptr, along, off)) {
       double chainage = 0.0;
       if ((!best.found || std::fabs(off) <= std::fabs(best.offset) + kSnap) &&
           element->distance2Chainage(along, chainage)) {
@@ -89,6 +89,31 @@ bool CAlntH::findOnAlignment(double north, double east, const std::vector<int>* 
   return best.found;
 }
 
+bool CAlntH::elementDistance(int index, double north, double east, bool remembered, double& distance) const {
+  const CAlntHe* element = m_elements[static_cast<std::size_t>(index)];
+  if (!remembered) return element->getShortestDistanceToPoint(north, east, distance);
+  svy_math::detail::TAlntElementAnswer& answer = m_searchIndex->answer(index);
+  if (answer.distanceStamp != m_searchIndex->stamp()) {
+    answer.distanceOk = element->getShortestDistanceToPoint(north, east, answer.distance);
+    answer.distanceStamp = m_searchIndex->stamp();
+  }
+  distance = answer.distance;
+  return answer.distanceOk;
+}
+
+bool CAlntH::elementFoot(int index, double north, double east, bool remembered, double& along, double& offset) const {
+  const CAlntHe* element = m_elements[static_cast<std::size_t>(index)];
+  if (!remembered) return element->getLengthAndOffset(north, east, along, offset);
+  svy_math::detail::TAlntElementAnswer& answer = m_searchIndex->answer(index);
+  if (answer.footStamp != m_searchIndex->stamp()) {
+    answer.footOk = element->getLengthAndOffset(north, east, answer.along, answer.offset);
+    answer.footStamp = m_searchIndex->stamp();
+  }
+  along = answer.along;
+  offset = answer.offset;
+  return answer.footOk;
+}
+
 // Beyond the start along the first element's start tangent, beyond the end along the last element's final
 // tangent; an extension wins only when strictly nearer than what was found on the alignment.
 bool CAlntH::extendBeyondEnds(double north, double east, bool found, TAlntStationResult& result) const {
@@ -110,7 +135,8 @@ bool CAlntH::extendBeyondEnds(double north, double east, bool found, TAlntStatio
     return found;
   }
   resolveAlongAcross(origin, azimuth, north, east, along, across);
-  if (along < 0.0) return found;
+  // Behind the final point (or a point off the number line): no extension.
+  if (!(along >= 0.0)) return found;
   double length = 0.0;
   if ((!found || std::fabs(across) < std::fabs(result.offset)) && getHLengthInM(length)) {
     result = TAlntStationResult{true, distance2Chainage(length + along), across, getNumOfElements() - 1, false, true};
@@ -123,7 +149,7 @@ bool CAlntH::FindChainageAndOffset(double north, double east, double& chainage, 
                                    bool* atJoint) const {
   CAlntAccessGuard guard(*this);
   TAlntStationResult result;
-  if (!findOnAlignment(north, east, nullptr, result, nullptr)) return false;
+  if (!findPoint(north, east, false, result)) return false;
   writeResult(result, chainage, offset, index, atJoint);
   return true;
 }
@@ -132,8 +158,7 @@ bool CAlntH::FindChainageAndOffset(double north, double east, double& chainage, 
                                    bool& extrapolated, int* index, bool* atJoint) const {
   CAlntAccessGuard guard(*this);
   TAlntStationResult result;
-  const bool found = findOnAlignment(north, east, nullptr, result, nullptr);
-  if (!extendBeyondEnds(north, east, found, result)) return false;
+  if (!findPoint(north, east, true, result)) return false;
   writeResult(result, chainage, offset, index, atJoint);
   extrapolated = result.extrapolated;
   return true;
@@ -143,6 +168,7 @@ bool CAlntH::FindChainageAndOffset(double north, double east, double& chainage, 
 // point resolved along and across it: a first-order inverse, good near the approximate chainage.
 bool CAlntH::FindApproxChainageAndOffset(double approxChainage, double north, double east, double& chainage,
                                          double& offset) const {
+  CAlntAccessGuard guard(*this);
   if (m_elements.empty()) return false;
   double distance = 0.0;
   const CAlntHe* element = findHeAtChain(approxChainage, &distance, nullptr);
@@ -165,55 +191,59 @@ bool CAlntH::FindApproxChainageAndOffset(double approxChainage, double north, do
   return true;
 }
 
-// ---- the batch query ----
+// ---- through the spatial index ----
 
-// The search over the elements near the point gives the full search's answer once no element outside the
-// searched square could have been accepted after the nearest offer was taken: every element outside offers
-// more than the radius, so the radius must exceed the largest best value held since then by tol::kSnap (the
-// tie margin). Otherwise the radius grows; at worst every element is searched.
-bool CAlntH::findIndexed(double north, double east, bool withExtension, svy_math::detail::TAlntSearchScratch& scratch,
-                         TAlntStationResult& result) const {
-  using namespace svy_math::tol;
-  bool found = false;
-  const C2dPos point(north, east);
-  double radius = m_searchIndex->nearestDistance(point, scratch) + kSearchStartRadius;
-  for (int step = 0;; ++step) {
-    if (!std::isfinite(radius) || step == kSearchRadiusDoublings) {
-      found = findOnAlignment(north, east, nullptr, result, nullptr);
-      break;
-    }
-    m_searchIndex->collect(point, radius, scratch);
-    if (scratch.candidates.size() >= m_elements.size()) {
-      found = findOnAlignment(north, east, nullptr, result, nullptr);
-      break;
-    }
-    svy_math::detail::TAlntSearchTrace trace;
-    TAlntStationResult local;
-    if (findOnAlignment(north, east, &scratch.candidates, local, &trace) && trace.maxSinceMin + kSnap < radius) {
-      result = local;
-      found = true;
-      break;
-    }
-    radius = std::fmax(2.0 * radius, trace.maxSinceMin + 2.0 * kSnap);
-  }
+bool CAlntH::findPoint(double north, double east, bool withExtension, TAlntStationResult& result) const {
+  const bool found =
+      m_useSearchIndex ? findThroughIndex(north, east, result) : findOnAlignment(north, east, nullptr, result, nullptr);
   return withExtension ? extendBeyondEnds(north, east, found, result) : found;
 }
 
-std::size_t CAlntH::FindChainagesAndOffsets(const double* north, const double* east, std::size_t count,
-                                            TAlntStationResult* results, bool withExtension) const {
-  CAlntAccessGuard guard(*this);
+// The search over the elements near the point gives the full search's answer once no element outside the
+// searched square could have been accepted after the nearest offer was taken. Every element outside offers
+// more than the radius (its box, grown by tol::kSearchIndexMargin, lies beyond it), so the smallest offer
+// lies inside, and the one search and the other, identical from the moment it is accepted, stay so while
+// the best value held since then stays below the radius by tol::kSnap (the tie margin). Otherwise the radius
+// grows; at worst every element is searched.
+bool CAlntH::findThroughIndex(double north, double east, TAlntStationResult& result) const {
+  using namespace svy_math::tol;
   if (!m_searchIndex) {
     std::vector<C2dMinMax> boxes;
     boxes.reserve(m_elements.size());
     for (const CAlntHe* element : m_elements) boxes.push_back(element->getBoundary());
     m_searchIndex.reset(new svy_math::detail::CAlntSearchIndex(boxes));
   }
-  svy_math::detail::TAlntSearchScratch scratch;
+  m_searchIndex->beginPoint();
+  const C2dPos point(north, east);
+  // A point off the number line is left to the plain scan, which finds nothing for it.
+  double radius = std::isfinite(north) && std::isfinite(east)
+                      ? m_searchIndex->nearestDistance(point) + kSearchStartRadius
+                      : svy_math::undefinedValue();
+  for (int step = 0;; ++step) {
+    const std::vector<int>* candidates =
+        std::isfinite(radius) && step < kSearchRadiusDoublings ? &m_searchIndex->collect(point, radius) : nullptr;
+    if (candidates == nullptr || candidates->size() >= m_elements.size()) {
+      return findOnAlignment(north, east, nullptr, result, nullptr);
+    }
+    svy_math::detail::TAlntSearchTrace trace;
+    TAlntStationResult local;
+    if (findOnAlignment(north, east, candidates, local, &trace) && trace.maxSinceMin + kSnap < radius) {
+      result = local;
+      return true;
+    }
+    radius = std::fmax(2.0 * radius, trace.maxSinceMin + 2.0 * kSnap);
+  }
+}
+
+std::size_t CAlntH::FindChainagesAndOffsets(const double* north, const double* east, std::size_t count,
+                                            TAlntStationResult* results, bool withExtension) const {
+  if (north == nullptr || east == nullptr || results == nullptr) return 0;
+  CAlntAccessGuard guard(*this);
   std::size_t found = 0;
   for (std::size_t k = 0; k < count; ++k) {
     TAlntStationResult& result = results[k];
     result = TAlntStationResult();
-    if (findIndexed(north[k], east[k], withExtension, scratch, result)) {
+    if (findPoint(north[k], east[k], withExtension, result)) {
       ++found;
     } else {
       result = TAlntStationResult();

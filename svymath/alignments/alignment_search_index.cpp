@@ -39,25 +39,33 @@ std::vector<TIndexEntry> toEntries(const std::vector<C2dMinMax>& boxes, std::vec
 // The packing constructor bulk-loads the tree (sort-tile-recursive), which also gives better queries than
 // inserting one box after another.
 CAlntSearchIndex::CAlntSearchIndex(const std::vector<C2dMinMax>& boxes)
-    : m_tree(toEntries(boxes, m_always)), m_count(boxes.size()) {}
+    : m_tree(toEntries(boxes, m_always)), m_count(boxes.size()), m_answers(boxes.size()), m_stamp(0) {}
 
-double CAlntSearchIndex::nearestDistance(const C2dPos& p, TAlntSearchScratch& scratch) const {
-  const TIndexPoint point(p.north(), p.east());
-  scratch.hits.clear();
-  m_tree.query(bgi::nearest(point, 1), std::back_inserter(scratch.hits));
-  return scratch.hits.empty() ? std::numeric_limits<double>::infinity()
-                              : boost::geometry::distance(point, scratch.hits.front().first);
+// Stamps run from 1; after the last one every answer is cleared and the stamps start again.
+void CAlntSearchIndex::beginPoint() const {
+  if (++m_stamp == 0) {
+    for (TAlntElementAnswer& answer : m_answers) answer = TAlntElementAnswer();
+    m_stamp = 1;
+  }
 }
 
-void CAlntSearchIndex::collect(const C2dPos& p, double radius, TAlntSearchScratch& scratch) const {
-  scratch.hits.clear();
-  scratch.candidates.clear();
+double CAlntSearchIndex::nearestDistance(const C2dPos& p) const {
+  const TIndexPoint point(p.north(), p.east());
+  m_hits.clear();
+  m_tree.query(bgi::nearest(point, 1), std::back_inserter(m_hits));
+  return m_hits.empty() ? std::numeric_limits<double>::infinity() : boost::geometry::distance(point, m_hits.front().first);
+}
+
+const std::vector<int>& CAlntSearchIndex::collect(const C2dPos& p, double radius) const {
+  m_hits.clear();
+  m_candidates.clear();
   const TIndexBox square(TIndexPoint(p.north() - radius, p.east() - radius),
                          TIndexPoint(p.north() + radius, p.east() + radius));
-  m_tree.query(bgi::intersects(square), std::back_inserter(scratch.hits));
-  for (const TIndexEntry& hit : scratch.hits) scratch.candidates.push_back(hit.second);
-  scratch.candidates.insert(scratch.candidates.end(), m_always.begin(), m_always.end());
-  std::sort(scratch.candidates.begin(), scratch.candidates.end());
+  m_tree.query(bgi::intersects(square), std::back_inserter(m_hits));
+  for (const TIndexEntry& hit : m_hits) m_candidates.push_back(hit.second);
+  m_candidates.insert(m_candidates.end(), m_always.begin(), m_always.end());
+  std::sort(m_candidates.begin(), m_candidates.end());
+  return m_candidates;
 }
 
 }  // namespace detail

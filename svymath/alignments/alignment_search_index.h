@@ -1,6 +1,12 @@
 #pragma once
 // Internal to the alignment: an R-tree over the plan boxes of an alignment's elements, the candidate source
-// of the batch point-to-chainage query, and the scratch buffers that query reuses from point to point.
+// of the point-to-chainage queries, with the buffers they reuse from point to point. The alignment uses it
+// under its access lock only, which also guards the buffers.
+// Boost marks one of its own headers, still included by Boost.Geometry and Boost.Thread, deprecated; the
+// notice is about Boost's internal include, not about ours.
+#ifndef BOOST_ALLOW_DEPRECATED_HEADERS
+#define BOOST_ALLOW_DEPRECATED_HEADERS
+#endif
 #include <cstddef>
 #include <limits>
 #include <utility>
@@ -36,10 +42,16 @@ struct TAlntSearchTrace {
   }
 };
 
-// Buffers of the batch query, kept from one point to the next.
-struct TAlntSearchScratch {
-  std::vector<TIndexEntry> hits;
-  std::vector<int> candidates;
+// What one element answered for the current point (its distance bound and its foot), kept so that a search
+// repeated over a wider square does not project the element again. Valid while its stamp is the index's.
+struct TAlntElementAnswer {
+  unsigned distanceStamp = 0;
+  bool distanceOk = false;
+  double distance = 0.0;
+  unsigned footStamp = 0;
+  bool footOk = false;
+  double along = 0.0;
+  double offset = 0.0;
 };
 
 class CAlntSearchIndex {
@@ -50,15 +62,23 @@ class CAlntSearchIndex {
 
   std::size_t size() const { return m_count; }
   // Distance from the point to the nearest grown box (0 inside one; infinity when there is none).
-  double nearestDistance(const C2dPos& p, TAlntSearchScratch& scratch) const;
+  double nearestDistance(const C2dPos& p) const;
   // The elements whose grown boxes meet the square of half-side `radius` about p, with those of undefined
-  // shape, in ascending order.
-  void collect(const C2dPos& p, double radius, TAlntSearchScratch& scratch) const;
+  // shape, in ascending order (valid until the next call).
+  const std::vector<int>& collect(const C2dPos& p, double radius) const;
+  // Forgets the elements' answers to the previous point.
+  void beginPoint() const;
+  TAlntElementAnswer& answer(int element) const { return m_answers[static_cast<std::size_t>(element)]; }
+  unsigned stamp() const { return m_stamp; }
 
  private:
   boost::geometry::index::rtree<TIndexEntry, boost::geometry::index::rstar<16>> m_tree;
   std::vector<int> m_always;
   std::size_t m_count;
+  mutable std::vector<TIndexEntry> m_hits;
+  mutable std::vector<int> m_candidates;
+  mutable std::vector<TAlntElementAnswer> m_answers;
+  mutable unsigned m_stamp;
 };
 
 }  // namespace detail

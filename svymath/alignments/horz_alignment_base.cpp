@@ -16,5 +16,6 @@ const CHorzAlntElemBase* CHorzAlntBase::getFirstHe() const { return getHe(0); }
 const CHorzAlntElemBase* CHorzAlntBase::getLastHe() const { return getHe(getNumOfElements() - 1); }
 
 void CHorzAlntBase::ForEachSegment(CGenericSegmentVisitor_const& visitor) const {
+  CAlntAccessGuard guard(*this);
   for (int i = 0; i < getNumOfElements(); ++i) getHe(i)->ForEachSegment(visitor);
 }

@@ -58,15 +58,6 @@ bool CAlntHe::getIpPos(double& north, double& east) const {
   return true;
 }
 
-void CAlntHe::warmCaches() const {
-  double north = 0.0;
-  double east = 0.0;
-  double length = 0.0;
-  double offset = 0.0;
-  if (getStartPosNe(north, east)) getLengthAndOffset(north, east, length, offset);
-  if (getFinalPosNe(north, east)) getLengthAndOffset(north, east, length, offset);
-}
-
 namespace {
 
 // Collects the plan extent of the segments handed to it.

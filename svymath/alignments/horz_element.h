@@ -53,9 +53,6 @@ class SVYMATH_API CAlntHe : public CHorzAlntElemBase, public CAlntElemImpl, publ
   virtual void onSetIndex(const CHorzAlntBase& alignment, int index) = 0;
   // Whether the element's own shape is defined (isok adds the placement).
   virtual bool isShapeOk() const = 0;
-  // Runs the queries that fill the lazily computed sines and cosines of the element's angles, so that
-  // concurrent readers afterwards only read them (the alignment calls it after re-anchoring).
-  void warmCaches() const;
 
   // Where element `index` of the alignment starts: the alignment's start for index < 1, else its
   // predecessor's end. Values that cannot be obtained stay chainage 0, undefined point and angle.

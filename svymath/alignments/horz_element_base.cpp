@@ -1,5 +1,7 @@
 #include "svymath/alignments/horz_element_base.h"
 
+#include <cmath>
+
 #include "svymath/foundation/constants.h"
 #include "svymath/foundation/math_angle.h"
 
@@ -22,7 +24,7 @@ bool CHorzAlntElemBase::getAzimuthAtChain(double chainage, double& azimuthDeg) c
 bool CHorzAlntElemBase::getAzimuthAtChainExtr(double chainage, double& azimuthDeg) const {
   double distance = 0.0;
   double length = 0.0;
-  if (!chainage2Distance(chainage, distance) || !getHLengthInM(length)) return false;
+  if (!chainage2Distance(chainage, distance) || !getHLengthInM(length) || std::isnan(distance)) return false;
   if (distance >= 0.0 && distance <= length) return getAzimuthAtLength(distance, azimuthDeg);
   CMathAngle azimuth;
   if (!(distance < 0.0 ? getStartAzimut(azimuth) : getFinalAzimut(azimuth))) return false;
@@ -48,7 +50,10 @@ bool CHorzAlntElemBase::getPosNeAtChainAndOffsetExtr(double chainage, double off
                                                      double& east) const {
   double distance = 0.0;
   double length = 0.0;
-  if (!chainage2Distance(chainage, distance) || !getHLengthInM(length)) return false;
+  if (!chainage2Distance(chainage, distance) || !getHLengthInM(length) || std::isnan(distance) ||
+      std::isnan(offset)) {
+    return false;
+  }
   C2dPos onLine;
   CMathAngle tangent;
   if (distance >= 0.0 && distance <= length) {

@@ -17,6 +17,9 @@ class SVYMATH_API CAlntHeT : public CAlntHe {
  public:
   using CHorzAlntElemBase::getAzimuthAtChain;
 
+  // Shape, placement and start azimuth control of another element of the same kind.
+  void copy(const CAlntHeT& other) { *this = other; }
+
   // ---- shape ----
   void set_data(const Curve& curve) { m_curve = curve; }
   const Curve& get_data() const { return m_curve; }

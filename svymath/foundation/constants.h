@@ -331,6 +331,10 @@ constexpr double kElementEqual = 1e-9;
 // an element accepts the foot of a point up to tol::kSnap beyond its ends, so an element whose box lies
 // farther than the margin minus that snap from the point cannot offer it a smaller offset.
 constexpr double kSearchIndexMargin = 2.0 * kSnap;
+// An intersection-point element whose previous ST lies beyond its TS by no more than this (metres) still
+// counts as touching it: ST and TS come from different IPs at survey coordinates, where a double resolves
+// about 1e-9 m and each is off by a few such spacings.
+constexpr double kIpTangentOverlap = 1e-8;
 // First search radius (metres) beyond the nearest element box: the radius then doubles until no element
 // outside it can change the answer.
 constexpr double kSearchStartRadius = 1.0;
