@@ -24,8 +24,7 @@ bool isDefinedByPoints(const CAlntVe& element) {
 CVertAlntBase::~CVertAlntBase() = default;
 
 // A vertical alignment holds vertical elements only.
-const CAlntVe* CVertAlntBase::getVe(int index) const { return static_cast<const CAlntVe*>(
-    static_cast<const CVertAlntElemBase*>(getElement(index))); }
+const CAlntVe* CVertAlntBase::getVe(int index) const { return static_cast<const CAlntVe*>(getElement(index)); }
 
 CAlntV::CAlntV() : m_startHeight(svy_math::undefinedValue()) {}
 

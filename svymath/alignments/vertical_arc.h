@@ -7,7 +7,7 @@
 // the grades are the angles theta = atan(g / 100); the element's length is the arc length |R (theta2 -
 // theta1)|, and it is measured along the chainage: the height at length s is the circle's height at the
 // chainage start + s. The circle's own horizontal extent, R (sin theta2 - sin theta1), is a little shorter
-// than the arc (2.5 cm for +3 % to -2 % at R 5000 m): past it the height follows the circle on, and the
+// than the arc (2.9 cm for +3 % to -2 % at R 5000 m): past it the height follows the circle on, and the
 // grade turns slightly beyond g2.
 //
 // Points of the profile plane are C2dPos holding the chainage in component 0 and the height in component 1.

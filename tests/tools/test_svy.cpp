@@ -101,6 +101,9 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
       {"spiral table --length 100 --radius 300 --interval 1e-9", "interval"},
       {"spiral table --type bloss --length 100 --radius 300 --interval 1", "bloss"},
       {"spiral table --length 100 --radius 0 --interval 1", "radius"},
+      {"profile height", "--pvi"}, {"profile height --pvi 0,100", "at least two"},
+      {"profile height --pvi 0,100 --pvi 50", "CH,H[,L]"},
+      {"profile height --pvi 0,100 --pvi 100,101,150 --pvi 150,100", "must not overlap"},
       {"cogo intersect --mode xy", "--mode"}, {"traverse adjust", "--start"}, {"traverse adjust --start 1", "--start"},
       {"traverse adjust --start 0,0 --rule simple", "--rule"},
   };
@@ -115,9 +118,22 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
   }
   const SvyResult help = runSvy({"--help"});
   EXPECT_EQ(help.exitStatus, 0);
-  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "traverse", "view"}) {
+  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "traverse",
+                             "view", "profile"}) {
     EXPECT_NE(help.out.find(family), std::string::npos) << family;
   }
+}
+
+// svy profile height: on the grades the line through the points; at a point with a parabola of length L the
+// grade change g2 - g1 lowers the height by the middle ordinate L (g1 - g2) / 800; outside a bad row.
+TEST(ProfileHeight, GradesAndMiddleOrdinates) {
+  const SvyResult r = runSvy({"profile", "height", "--pvi", "1000,50", "--pvi", "1200,56,120", "--pvi", "1500,47"},
+                             "chainage\n1000\n1100\n1200\n1350\n1500\n1500.5\n");
+  EXPECT_EQ(r.exitStatus, 1);
+  EXPECT_EQ(r.out, "chainage,height,grade_pct\n1000.0000,50.0000,3.0000\n1100.0000,53.0000,3.0000\n"
+                   "1200.0000,55.1000,0.0000\n1350.0000,51.5000,-3.0000\n1500.0000,47.0000,-3.0000\n");
+  EXPECT_EQ(r.errLines(),
+            std::vector<std::string>{"svy: line 7: chainage 1500.5000 lies outside the profile (1000.0000 to 1500.0000)"});
 }
 
 // svy angle convert: known equivalents, the packed DDD.MMSS quirks, and round trips through every unit.

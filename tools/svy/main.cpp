@@ -23,6 +23,7 @@ int main(int argc, char** argv) {
   registerCurveVerbs(app);
   registerGeoVerbs(app);
   registerTimeVerbs(app);
+  registerProfileVerbs(app);
   registerLocalizeVerbs(app);
   registerResectVerbs(app);
   registerTraverseVerbs(app);
