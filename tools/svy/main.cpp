@@ -29,6 +29,7 @@ int main(int argc, char** argv) {
   registerTraverseVerbs(app);
   registerViewVerbs(app);
   registerAreaVerbs(app);
+  registerAlignVerbs(app);
 
   try {
     app.parse(argc, argv);
