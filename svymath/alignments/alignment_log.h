@@ -1,5 +1,6 @@
 #pragma once
-// Source names under which the alignment code logs unexpected internal states.
+// Source names under which the alignment code logs unexpected internal states (vertical arcs log a
+// length outside the element).
 namespace svy_math {
 
 constexpr const char* kAlntElementsLogSource = "mathAlntElements";
