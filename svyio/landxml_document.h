@@ -49,3 +49,12 @@ bool readLandXmlFile(const std::string& path, TLandXmlDocument& document, std::s
 bool readLandXmlText(const std::string& text, TLandXmlDocument& document, std::string& error);
 
 }  // namespace svy_io
+
+namespace svy_io {
+
+// The alignments and their design profiles as LandXML 1.2 text (metres, decimal degrees), every number
+// with the digits that read back to the same double, so that reading the text gives the same geometry.
+std::string writeLandXmlText(const TLandXmlDocument& document);
+bool writeLandXmlFile(const std::string& path, const TLandXmlDocument& document, std::string& error);
+
+}  // namespace svy_io

@@ -274,3 +274,52 @@ TEST(LandXmlProfile, UnsymmetricAndCircularCurves) {
 }
 
 }  // namespace
+
+namespace {
+
+// Reading what the writer wrote gives the same geometry: positions along the alignments (1e-9 m), heights
+// along their profiles (1e-8 m: a circular vertical curve is written by its intersection point, which the
+// reader turns back into the circle's tangent points through a tangent and a cosine), the station equations.
+void expectSameRoad(const TLandXmlDocument& a, const TLandXmlDocument& b) {
+  ASSERT_EQ(a.alignments.size(), b.alignments.size());
+  for (std::size_t k = 0; k < a.alignments.size(); ++k) {
+    const CAlntH& h1 = a.alignments[k].horizontal;
+    const CAlntH& h2 = b.alignments[k].horizontal;
+    ASSERT_EQ(h1.getNumOfHes(), h2.getNumOfHes());
+    double length = 0.0;
+    ASSERT_TRUE(h1.getHLengthInM(length));
+    for (double s = 0.0; s <= length; s += length / 997.0) {
+      const double chainage = h1.getStartChainageInM() + s;
+      double n1 = 0.0, e1 = 0.0, n2 = 0.0, e2 = 0.0;
+      ASSERT_TRUE(h1.getPosNeAtChain(chainage, n1, e1) && h2.getPosNeAtChain(chainage, n2, e2));
+      EXPECT_LE(std::hypot(n1 - n2, e1 - e2), 1e-9) << chainage;
+      for (std::size_t p = 0; p < a.alignments[k].profiles.size(); ++p) {
+        double z1 = 0.0, z2 = 0.0;
+        if (a.alignments[k].profiles[p].profile.getHeightAtChain(chainage, z1)) {
+          ASSERT_TRUE(b.alignments[k].profiles.at(p).profile.getHeightAtChain(chainage, z2)) << chainage;
+          EXPECT_NEAR(z1, z2, 1e-8) << chainage;
+        }
+      }
+    }
+    EXPECT_EQ(a.alignments[k].equations.getCount(), b.alignments[k].equations.getCount());
+  }
+}
+
+class RoundTrip : public ::testing::TestWithParam<std::string> {};
+
+TEST_P(RoundTrip, WrittenFileReadsBackToTheSameGeometry) {
+  TLandXmlDocument first, second;
+  std::string error;
+  ASSERT_TRUE(svy_io::readLandXmlFile(GetParam(), first, error)) << error;
+  ASSERT_TRUE(svy_io::readLandXmlText(svy_io::writeLandXmlText(first), second, error)) << error;
+  expectSameRoad(first, second);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Files, RoundTrip,
+    ::testing::Values(std::string(SVY_EXAMPLES_DIR) + "/road/sample_road.xml",
+                      svy_test::testdataPath(kFolder + "UT-Alignment-Aplitop-1.xml"),
+                      svy_test::testdataPath(kFolder + "Alignment-Aplitop-2.XML"),
+                      svy_test::testdataPath(kFolder + "PR_Twin_Branch_section_alignment.xml")));
+
+}  // namespace
