@@ -1,5 +1,5 @@
-// Hot paths of the transition spirals: the Fresnel integrals in each regime (series below 1.5, continued
-// fraction above), clothoid and cubic positions (what every chainage query on a spiral element costs), the
+// Hot paths of the transition spirals: the Fresnel integrals in each regime (series below 1.5, fitted
+// auxiliary functions up to 7, their asymptotic series beyond), clothoid and cubic positions (what every chainage query on a spiral element costs), the
 // cubic's radius search when an element is defined, and the chord step of a staking run.
 #include <benchmark/benchmark.h>
 
@@ -26,8 +26,9 @@ void fresnel(benchmark::State& state, double lo, double hi) {
 
 void BM_FresnelSeriesSmall(benchmark::State& state) { fresnel(state, 0.01, 0.5); }
 void BM_FresnelSeriesNearSwitch(benchmark::State& state) { fresnel(state, 1.0, 1.5); }
-void BM_FresnelFractionNearSwitch(benchmark::State& state) { fresnel(state, 1.5, 2.0); }
-void BM_FresnelFractionLarge(benchmark::State& state) { fresnel(state, 5.0, 50.0); }
+void BM_FresnelAuxiliaryNearSwitch(benchmark::State& state) { fresnel(state, 1.5, 2.0); }
+void BM_FresnelAuxiliaryFitted(benchmark::State& state) { fresnel(state, 2.0, 7.0); }
+void BM_FresnelAuxiliaryAsymptotic(benchmark::State& state) { fresnel(state, 7.0, 1000.0); }
 
 template <class Law>
 void positions(benchmark::State& state, const Law& law) {
@@ -82,8 +83,9 @@ void BM_SpiralStepForDeviation(benchmark::State& state) {
 
 BENCHMARK(BM_FresnelSeriesSmall);
 BENCHMARK(BM_FresnelSeriesNearSwitch);
-BENCHMARK(BM_FresnelFractionNearSwitch);
-BENCHMARK(BM_FresnelFractionLarge);
+BENCHMARK(BM_FresnelAuxiliaryNearSwitch);
+BENCHMARK(BM_FresnelAuxiliaryFitted);
+BENCHMARK(BM_FresnelAuxiliaryAsymptotic);
 BENCHMARK(BM_ClothoidPosition);
 BENCHMARK(BM_CubicPosition);
 BENCHMARK(BM_CubicSetLenAndR);

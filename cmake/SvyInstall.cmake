@@ -3,6 +3,15 @@ include(CMakePackageConfigHelpers)
 
 set(SVYMATH_CMAKE_DIR ${CMAKE_INSTALL_LIBDIR}/cmake/svymath)
 
+# Installed binaries find their libraries relative to themselves, wherever the prefix is and without
+# LD_LIBRARY_PATH or ldconfig: a library finds its sibling in its own folder, the tool looks from bin/ into
+# lib/. The run path is RUNPATH, so a user's LD_LIBRARY_PATH still wins when they set one on purpose.
+file(RELATIVE_PATH SVY_BIN_TO_LIB ${CMAKE_INSTALL_FULL_BINDIR} ${CMAKE_INSTALL_FULL_LIBDIR})
+set_target_properties(svyutils svymath PROPERTIES INSTALL_RPATH "$ORIGIN")
+if(TARGET svy)
+  set_target_properties(svy PROPERTIES INSTALL_RPATH "$ORIGIN/${SVY_BIN_TO_LIB}")
+endif()
+
 install(TARGETS svyutils svymath EXPORT svymathTargets
   LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
   ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR}

@@ -10,9 +10,11 @@
 //            distance, already the least-squares radius, so the first correction is zero and the fit
 //            converges at once: the sign never acts.
 //
-// Survey coordinates (N 5 000 000, E 500 000) keep their accuracy: the circle's rows use differences from
-// the centre only, its initial guess is computed relative to the centroid, and the line's solution is
-// refined from its residuals (see leastSquares).
+// Survey coordinates (N 5 000 000, E 500 000) keep their accuracy: the line and every Gauss-Newton step are
+// solved relative to the centroid (their constant column makes leastSquares centre them), the circle's
+// rows use differences from the centre only and its initial guess is computed relative to the centroid. A
+// line whose eastings differ only by the rounding of the coordinates is refused (eLsqSingular); a circle
+// iterates until its corrections are within the rounding of its misclosures.
 #include "svymath/adjustment/best_fit_points.h"
 #include "svymath/adjustment/least_squares.h"
 #include "svymath/foundation/export.h"
@@ -61,6 +63,8 @@ class SVYMATH_API TBestFitCurveData : public TNonLinearLeastSquaresData {
   TLsqMatrix getAMatrix() const override;
   TLsqMatrix getYMatrix() const override;
   TLsqMatrix getWeightMatrix() const override;
+  // A few units of the last place of the radius: the rounding of the distances d and of d - r.
+  double getMisclosureRounding() const override;
 
  private:
   TBestFitPoints m_points;

@@ -1,5 +1,6 @@
 #include <cmath>
 #include <cstddef>
+#include <limits>
 
 #include "svymath/adjustment/best_fit.h"
 #include "svymath/adjustment/spd_inverse.h"
@@ -108,6 +109,12 @@ TLsqMatrix TBestFitCurveData::getYMatrix() const {
   std::size_t row = 0;
   for (const C2dPos& p : m_points.points()) y(row++, 0) = std::hypot(u - p.east(), v - p.north()) - r;
   return y;
+}
+
+double TBestFitCurveData::getMisclosureRounding() const {
+  if (!hasCurrentSolution()) return 0.0;
+  // Each misclosure d - r rounds at a few units of the last place of the radius.
+  return limits::kCircleMisclosureUlps * std::numeric_limits<double>::epsilon() * std::fabs(currentSolution()[2]);
 }
 
 TLsqMatrix TBestFitCurveData::getWeightMatrix() const {

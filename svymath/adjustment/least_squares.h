@@ -69,6 +69,10 @@ class SVYMATH_API TNonLinearLeastSquaresData : public TLeastSquaresData {
   // Whether the last correction changed every unknown by at most its criterion. False before any
   // correction; logged (and false unless criteria follow) when no criteria were set.
   bool hasConverged() const;
+  // The rounding error of one misclosure at the current solution (its unit), for example the rounding of the
+  // distances it is the difference of; 0 (the default) for misclosures taken as exact. Gauss-Newton ends
+  // once a correction is no larger than this error carried into the unknowns.
+  virtual double getMisclosureRounding() const;
   // Root mean square of the misclosures Y at the current solution; NaN without one.
   double getMisclosureRms() const;
 
@@ -91,6 +95,10 @@ class SVYMATH_API TNonLinearLeastSquaresData : public TLeastSquaresData {
 //
 // W must be symmetric (a weight matrix is): the normal matrix is built from its lower triangle. Any
 // non-finite element of A, Y or W gives eLsqNotFinite.
+// A problem with an intercept column (one non-zero value in every row) is solved relative to the means of
+// its other columns and of Y: the same solution exactly, without the digits that large coordinates cost
+// the normal equations; a column that after this varies only by the rounding of its values (1e-10 of them)
+// makes the problem singular (eLsqSingular).
 // The normal matrix is inverted through its Cholesky factor; a pivot at or below 1e-14 of its diagonal
 // element makes it singular (eLsqSingular). The solution is then refined by solving again for the residuals
 // Y - A X (computed from the original A and Y): this recovers the digits that forming A^T W A loses when
@@ -98,9 +106,11 @@ class SVYMATH_API TNonLinearLeastSquaresData : public TLeastSquaresData {
 // solution as it was.
 SVYMATH_API ELeastSquaresStatus leastSquares(svy_vector<double>& solution, const TLeastSquaresData& data);
 
-// Gauss-Newton from the data's initial guess until hasConverged(). Each correction is a leastSquares()
-// solution at the current solution; a failing step ends the loop with its status (eLsqNotFinite when a
-// correction is not finite). The loop has no iteration limit of its own beyond a safety cap of 1000
+// Gauss-Newton from the data's initial guess until hasConverged(), or until a correction is within the
+// rounding of the misclosures (getMisclosureRounding) carried into each unknown: criteria finer than the
+// data's own precision end there instead of cycling. Each correction is a leastSquares() solution at the
+// current solution; a failing step ends the loop with its status (eLsqNotFinite when a correction is not
+// finite). The loop has no iteration limit of its own beyond a safety cap of 1000
 // iterations (eLsqNoConvergence), a hundred times what a well-posed fit needs. solution receives the final
 // current solution.
 SVYMATH_API ELeastSquaresStatus gaussNewtonLeastSquares(svy_vector<double>& solution,

@@ -140,7 +140,8 @@ bool CAlntV::getHeightAtChainExtr(double chainage, double& height, bool& extrapo
     return true;
   }
   double finalChainage = 0.0;
-  if (m_elements.empty() || !getFinalChainageInM(finalChainage)) return false;
+  // A chainage off the number line has no height, not an infinite one.
+  if (!std::isfinite(chainage) || m_elements.empty() || !getFinalChainageInM(finalChainage)) return false;
   double h = 0.0;
   const double distance = chainage2Distance(chainage);
   if (chainage < finalChainage) {

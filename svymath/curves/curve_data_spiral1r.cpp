@@ -15,10 +15,14 @@ namespace {
 // The kind code of spiral data, shared with the alignment's spiral element.
 constexpr int kSpiralDataType = 2;
 
-// Projection of a point onto the spiral: the element is sampled at this many intervals to bracket every
-// foot point (a spiral turns by less than a quarter turn over a sample interval, so each interval holds at
-// most one minimum of the distance).
+// Projection of a point onto the spiral: where the pieces cannot rule out a hidden minimum, the element is
+// sampled at this many intervals to bracket every foot point (a spiral turns by less than a quarter turn
+// over a sample interval, so each interval holds at most one minimum of the distance).
 constexpr int kProjectionSamples = 32;
+// Largest sharpest curvature times length of a projection piece: a piece then turns by at most half a
+// radian (well inside the half turn that keeps the stationary points of the distance to two), and points
+// within half the radius of it pass the bound that rules out a hidden minimum.
+constexpr double kPieceCurvatureLength = 0.5;
 // Cap of the refinement in one bracket. Newton converges in a handful of steps and the bisection fallback
 // halves the bracket each step, so 100 steps reach below kProjectionLength for any bracket up to 1e20 m.
 constexpr int kRefineIterationCap = 100;
@@ -205,51 +209,90 @@ bool CCurveDataSpiral1R::componentsAt(double north, double east, double s, doubl
   return std::isfinite(along) && std::isfinite(offset);
 }
 
+bool CCurveDataSpiral1R::refineFoot(double north, double east, double a, double b, double aAlong, double bAlong,
+                                    TFoot& candidate) const {
+  double s = a + (b - a) * aAlong / (aAlong - bAlong);
+  for (int iteration = 0; iteration < kRefineIterationCap; ++iteration) {
+    if (!componentsAt(north, east, s, candidate.along, candidate.offset)) return false;
+    if (candidate.along > 0.0) {
+      a = s;
+    } else {
+      b = s;
+    }
+    // d(along)/ds = -1 + curvature * offset: negative wherever the point is a distance minimum.
+    const double slope = -1.0 + getCurvatureAtLength(s) * candidate.offset;
+    double next = slope < 0.0 ? s - candidate.along / slope : 0.5 * (a + b);
+    // A Newton step below the tolerance has converged, even where it rounds onto an end of the bracket (s
+    // is one of them); only a real step out of the bracket falls back to bisection.
+    const bool settled = std::fabs(next - s) < kProjectionLength;
+    if (settled) {
+      next = std::fmin(std::fmax(next, a), b);
+    } else if (!(next > a && next < b)) {
+      next = 0.5 * (a + b);
+    }
+    s = next;
+    if (settled || b - a < kProjectionLength) break;
+  }
+  candidate.length = s;
+  candidate.interior = true;
+  return componentsAt(north, east, s, candidate.along, candidate.offset);
+}
+
+double CCurveDataSpiral1R::sharpestCurvature() const { return 1.0 / std::fabs(m_law->getRadius()); }
+
+int CCurveDataSpiral1R::projectionPieces(double total) const {
+  const double pieces = std::ceil(sharpestCurvature() * total / kPieceCurvatureLength);
+  if (!(pieces <= kProjectionSamples)) return 0;
+  return pieces < 1.0 ? 1 : static_cast<int>(pieces);
+}
+
+// The element is cut into pieces that turn by at most half a radian. The curvature of a spiral is monotone,
+// so its centres of curvature form a convex arc; the normals of a piece are the tangents of that arc, and at
+// most two of them pass through any point: the distance from the point has at most two stationary lengths
+// on a piece. When the along component falls through zero between the ends of a piece, that is its one
+// minimum. When it has the same sign at both ends there is none, unless the point lies beyond a centre of
+// curvature of the piece (curvature * offset > 1 somewhere on it). The offsets on a piece are bounded by the
+// distances to its ends and its length, the curvature by that of the law's sharp end; where these bounds
+// cannot exclude a hidden minimum, the element is searched again at kProjectionSamples intervals.
 bool CCurveDataSpiral1R::findFoot(double north, double east, TFoot& foot) const {
   const double total = getTotalLength();
   if (!isok() || !(total >= 0.0) || !std::isfinite(total)) return false;
+  const int pieces = projectionPieces(total);
+  if (pieces > 0) {
+    const EFootScan scan = scanFoot(north, east, total, pieces, true, foot);
+    if (scan != EFootScan::kDense) return scan == EFootScan::kFound;
+  }
+  return scanFoot(north, east, total, kProjectionSamples, false, foot) == EFootScan::kFound;
+}
+
+CCurveDataSpiral1R::EFootScan CCurveDataSpiral1R::scanFoot(double north, double east, double total, int intervals,
+                                                           bool boundPieces, TFoot& foot) const {
   TFoot best;
-  if (!componentsAt(north, east, 0.0, best.along, best.offset)) return false;
+  if (!componentsAt(north, east, 0.0, best.along, best.offset)) return EFootScan::kFailed;
+  const double sharpest = boundPieces ? sharpestCurvature() : 0.0;
   double lo = 0.0;
   double loAlong = best.along;
-  for (int i = 1; i <= kProjectionSamples; ++i) {
-    const double hi = total * i / kProjectionSamples;
+  double loDistance = best.distance();
+  for (int i = 1; i <= intervals; ++i) {
+    const double hi = total * i / intervals;
     TFoot sample;
     sample.length = hi;
-    if (!componentsAt(north, east, hi, sample.along, sample.offset)) return false;
-    if (i == kProjectionSamples && sample.distance() < best.distance()) best = sample;
-    // The distance has a minimum where the along component falls through zero.
+    if (!componentsAt(north, east, hi, sample.along, sample.offset)) return EFootScan::kFailed;
+    if (i == intervals && sample.distance() < best.distance()) best = sample;
     if (loAlong > 0.0 && sample.along <= 0.0) {
-      double a = lo;
-      double b = hi;
-      double s = a + (b - a) * loAlong / (loAlong - sample.along);
       TFoot candidate;
-      for (int iteration = 0; iteration < kRefineIterationCap; ++iteration) {
-        candidate.length = s;
-        if (!componentsAt(north, east, s, candidate.along, candidate.offset)) return false;
-        if (candidate.along > 0.0) {
-          a = s;
-        } else {
-          b = s;
-        }
-        // d(along)/ds = -1 + curvature * offset: negative wherever the point is a distance minimum.
-        const double slope = -1.0 + getCurvatureAtLength(s) * candidate.offset;
-        double next = slope < 0.0 ? s - candidate.along / slope : 0.5 * (a + b);
-        if (!(next > a && next < b)) next = 0.5 * (a + b);
-        const bool converged = std::fabs(next - s) < kProjectionLength || b - a < kProjectionLength;
-        s = next;
-        if (converged) break;
-      }
-      candidate.length = s;
-      if (!componentsAt(north, east, s, candidate.along, candidate.offset)) return false;
-      candidate.interior = true;
+      if (!refineFoot(north, east, lo, hi, loAlong, sample.along, candidate)) return EFootScan::kFailed;
       if (candidate.distance() < best.distance()) best = candidate;
+    } else if (boundPieces && (loAlong > 0.0) == (sample.along > 0.0) &&
+               !(sharpest * 0.5 * (loDistance + sample.distance() + hi - lo) < 1.0)) {
+      return EFootScan::kDense;
     }
     lo = hi;
     loAlong = sample.along;
+    loDistance = sample.distance();
   }
   foot = best;
-  return true;
+  return EFootScan::kFound;
 }
 
 bool CCurveDataSpiral1R::getShortestDistAndCurveLen(double north, double east, double& dist,
@@ -286,9 +329,13 @@ double CCurveDataSpiral1R::getFinalAzimutInRad() const {
   return GetAzimuth(getTotalLength()) * svy_math::units::kDegToRad;
 }
 
-double CCurveDataSpiral1R::getRadius() const { return m_isTSSC ? m_law->getRadius() : -m_law->getRadius(); }
+double CCurveDataSpiral1R::getRadius() const {
+  if (!m_law->isok()) return 0.0;
+  return m_isTSSC ? m_law->getRadius() : -m_law->getRadius();
+}
 
 double CCurveDataSpiral1R::getSpiralParam() const {
+  if (!m_law->isok()) return 0.0;
   return std::sqrt(std::fabs(m_law->getRadius() * m_law->getLength()));
 }
 

@@ -72,9 +72,11 @@ class SVYMATH_API CCurveDataSpiral1R {
   // distance (positive when the point lies right of the direction of travel at that length). An end point
   // is returned (len 0 or the total length) when the nearest point is an end. False for undefined data.
   bool getShortestDistAndCurveLen(double north, double east, double& dist, double& len) const;
-  // The nearest foot of a perpendicular from the local point, or the nearer end, by 32 samples and then a
-  // bracketed Newton search on the foot-point condition (bisection fallback) converging to
-  // tol::kProjectionLength. False for undefined data or a non-finite point.
+  // The nearest foot of a perpendicular from the local point, or the nearer end: the element is cut into
+  // pieces of at most half a radian of turn, each foot bracketed by the along component changing sign between the
+  // ends of a piece (32 samples instead where a piece could hide one) and found by a Newton search on the
+  // foot-point condition (bisection fallback) converging to tol::kProjectionLength. False for undefined
+  // data or a non-finite point.
   struct TFoot {
     double length = 0.0;    // length of the foot (or end) on the element
     double along = 0.0;     // component along the tangent there (0 at a true foot)
@@ -118,6 +120,17 @@ class SVYMATH_API CCurveDataSpiral1R {
  protected:
   // Components along and across the tangent at length s of the vector from that point to the local point.
   bool componentsAt(double north, double east, double s, double& along, double& offset) const;
+  // The foot between a and b, where along(a) > 0 >= along(b): bracketed Newton with bisection fallback.
+  bool refineFoot(double north, double east, double a, double b, double aAlong, double bAlong, TFoot& candidate) const;
+  // Curvature of the law's sharp end (1/m, unsigned): no part of the element is sharper.
+  double sharpestCurvature() const;
+  // Number of projection pieces of the element (see findFoot); 0 when it needs more than the dense samples.
+  int projectionPieces(double total) const;
+  // How a scan of the element for the nearest foot or end ended.
+  enum class EFootScan { kFound, kDense, kFailed };
+  // The nearest foot or end from the element cut into intervals of equal length, each sign change of the
+  // along component refined; with boundPieces, kDense when an interval may hide a minimum (see findFoot).
+  EFootScan scanFoot(double north, double east, double total, int intervals, bool boundPieces, TFoot& foot) const;
   // Law length s of element length s (the law runs backwards under a CS-to-ST element).
   double lawLength(double s) const { return m_isTSSC ? s : m_law->getLength() - s; }
   // Position of the full spiral at element length s without the range check.

@@ -240,6 +240,10 @@ constexpr double kJacobiRange = 1e-12;
 // n = m e + b the ratio is var(e) / mean(e^2), so at E 500 000 eastings with a standard deviation above
 // 5 cm still pass.
 constexpr double kPivotRelativeZero = 1e-14;
+// A design column taken relative to its mean whose widest entry is at or below this fraction of its largest
+// raw entry is refused as singular: the rounding of the data (1.1e-16 of each value) would then make up more
+// than a millionth of the differences that define its unknown. At E 500 000 that is 50 micrometres.
+constexpr double kCentredSpreadRelativeZero = 1e-10;
 // Eigenvalues of a symmetric matrix at or below this fraction of the largest (in absolute value) are
 // zero to the pseudo-inverse.
 constexpr double kPseudoInverseRelativeZero = 1e-12;
@@ -255,6 +259,14 @@ constexpr int kJacobiSweepCap = 100;
 // Gauss-Newton iterations of one solve. Well-posed fits (circle, radius) converge in 3 to 10; the cap,
 // a hundred times that, only ends a problem whose convergence criteria can never be met.
 constexpr int kGaussNewtonIterationCap = 1000;
+// A Gauss-Newton correction within this many times the rounding of the misclosures carried into an unknown
+// is noise. Near a solution the corrections of a fit whose misclosures round at level r wander by about
+// r times that gain; a factor of 10 ends them there and leaves any real step (orders of magnitude larger)
+// alone.
+constexpr double kRoundingNoiseFactor = 10.0;
+// Units of the last place of the radius in which a circle fit's misclosure d - r rounds: the distance d
+// from the difference of coordinates (exact near each other), its square root, and the subtraction.
+constexpr double kCircleMisclosureUlps = 2.0;
 
 // Orientations tried for the starting position (a half-degree grid): Gauss-Newton converges from within a
 // few degrees of any sound geometry.
@@ -359,6 +371,17 @@ constexpr double kMaxChainageStations = 1.0e6;
 
 }  // namespace limits
 
+}  // namespace svy_math
+
+// Road cross-sections and slopes.
+namespace svy_math {
+namespace tol {
+
+// Rise over run reported between two section points at the same offset (a vertical face such as a kerb
+// face given by two points): a finite stand-in for an infinite slope, signed by the rise.
+constexpr double kVerticalSlopeRatio = 1.0e6;
+
+}  // namespace tol
 }  // namespace svy_math
 
 // Areas bounded by lines and arcs, and their subdivision by a known area.

@@ -227,6 +227,53 @@ TEST(BestFitLine, MatchesCentredClosedFormAndStatuses) {
   EXPECT_EQ(svy_math::leastSquares(solution, vertical), svy_math::eLsqTooFewObservations);
 }
 
+// Ten exact points of a steep line at survey coordinates: 100 m of northing over a small easting spread.
+// Solved on raw coordinates the normal equations lose the line (21.8 m off at 0.2 m of spread); relative to
+// the centroid it is the same line, exact to the rounding of the data. Eastings that differ only in their
+// last digits carry no line at all and are refused.
+TEST(BestFitLine, SteepLineAtSurveyCoordinatesKeepsItsAccuracy) {
+  for (const double spread : {0.2, 0.25, 0.3, 1.0}) {
+    SCOPED_TRACE(spread);
+    TBestFitLineData data;
+    const double slope = 100.0 / spread;
+    for (int k = 0; k < 10; ++k) data.addData(C2dPos(kNorthOrigin + 100.0 * k / 9.0, kEastOrigin + spread * k / 9.0));
+    svy_vector<double> solution;
+    ASSERT_EQ(svy_math::leastSquares(solution, data), svy_math::eLsqOk);
+    EXPECT_NEAR(solution[0] / slope, 1.0, 1e-8);
+    EXPECT_NEAR(solution[0] * (kEastOrigin + 0.5 * spread) + solution[1] - kNorthOrigin, 50.0, 1e-6);
+    EXPECT_LT(data.getRms(solution), 1e-6);
+  }
+  TBestFitLineData rounding;
+  for (int k = 0; k < 10; ++k)
+    rounding.addData(C2dPos(kNorthOrigin + k, k % 2 ? std::nextafter(kEastOrigin, 1e6) : kEastOrigin));
+  svy_vector<double> solution;
+  EXPECT_EQ(svy_math::leastSquares(solution, rounding), svy_math::eLsqSingular);
+}
+
+// Nearly straight arcs at survey coordinates (radius 25 km over a 100 m chord, 4.5 to 11 km over 30 m):
+// the centre is known only to the rounding of the data times (radius / chord)^2, and the iteration must
+// still end at it rather than cycle at that level.
+TEST(BestFitCircle, NearlyStraightArcsConvergeAtSurveyCoordinates) {
+  const struct {
+    double chord, rise;
+  } cases[] = {{100.0, 0.05}, {30.0, 0.01}, {30.0, 0.02}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.chord);
+    const double radius = (c.chord * c.chord / 4.0 + c.rise * c.rise) / (2.0 * c.rise);
+    const double halfAngle = std::asin(0.5 * c.chord / radius);
+    const C2dPos centre(kNorthOrigin + 3.0, kEastOrigin + 7.0 + radius);
+    TBestFitCurveData data(arcPoints(centre, radius, 1.5 * svy_math::units::kPi - halfAngle,
+                                     1.5 * svy_math::units::kPi + halfAngle, 5, 0.0, 1));
+    data.setConvergenceCriteria(svy_vector<double>(3, 1e-7));
+    svy_vector<double> solution;
+    ASSERT_EQ(svy_math::gaussNewtonLeastSquares(solution, data), svy_math::eLsqOk);
+    EXPECT_NEAR(solution[0], centre.east(), 2e-4);
+    EXPECT_NEAR(solution[1], centre.north(), 2e-4);
+    EXPECT_NEAR(solution[2], radius, 2e-4);
+    EXPECT_LT(data.getMisclosureRms(), 1e-8);
+  }
+}
+
 // Exact and noisy arcs (full circle and short arcs) at survey coordinates: the centre (u east, v north) and
 // radius, and for noisy points a misclosure RMS near the noise.
 TEST(BestFitCircle, RecoversCentreAndRadiusAtSurveyCoordinates) {
@@ -315,6 +362,20 @@ TEST(BestFitRadius, ConvergesAfterOneZeroCorrection) {
     meanDistance += std::hypot(p.north() - centre.north(), p.east() - centre.east()) / 25.0;
   EXPECT_NEAR(solution[0], meanDistance, 1e-9);
   EXPECT_NEAR(solution[0], 80.0, 0.003);
+
+  // Distances 9, 10, 12 and 13 fit the radius 11 with misclosures -2, -1, 1, 2: the RMS is sqrt(10 / 4), taken
+  // over the n observations (the residual count, not n - 1). The line's residuals +-1 give 1 likewise.
+  TBestFitRadiusData spread;
+  spread.setCircleCenter(centre);
+  for (double d : {9.0, 10.0, 12.0, 13.0}) spread.addData(C2dPos(centre.north() + d, centre.east()));
+  spread.setConvergenceCriteria(svy_vector<double>{1e-9});
+  ASSERT_EQ(svy_math::gaussNewtonLeastSquares(solution, spread), svy_math::eLsqOk);
+  EXPECT_NEAR(solution[0], 11.0, 1e-9);
+  EXPECT_NEAR(spread.getMisclosureRms(), std::sqrt(2.5), 1e-9);
+  TBestFitLineData line;
+  for (const C2dPos& p : {C2dPos(1, 0), C2dPos(-1, 0), C2dPos(2, 1), C2dPos(0, 1)}) line.addData(p);
+  ASSERT_EQ(svy_math::leastSquares(solution, line), svy_math::eLsqOk);
+  EXPECT_NEAR(line.getRms(solution), 1.0, 1e-14);
 
   TBestFitRadiusData bare;
   EXPECT_EQ(bare.computeInitialGuess(), svy_math::eLsqTooFewObservations);

@@ -305,6 +305,24 @@ TEST(CovarEigen, ErrorEllipsoidAndNonFinite) {
   EXPECT_TRUE(std::isnan(covar(1.0, INFINITY, 2.0, 0.0, 0.0, 3.0).GetEigen(1.0)[0]));
 }
 
+// Semi-definite covariances v v^T + w w^T of random vectors: the Jacobi sweeps leave the zero eigenvalue a
+// rounding hair either side of 0, and the axis must stay 0 (not NaN); the squared axes sum to the trace.
+TEST(CovarEigen, RankTwoCovariancesKeepAZeroAxis) {
+  std::mt19937 rng(11);
+  std::uniform_real_distribution<double> value(-0.01, 0.01);
+  for (int trial = 0; trial < 200; ++trial) {
+    double v[3], w[3];
+    for (int k = 0; k < 3; ++k) v[k] = value(rng), w[k] = value(rng);
+    const auto element = [&](int i, int j) { return v[i] * v[j] + w[i] * w[j]; };
+    const covar c(element(0, 0), element(1, 0), element(1, 1), element(2, 0), element(2, 1), element(2, 2));
+    const Vec3 axes = c.GetEigen(1.0);
+    ASSERT_TRUE(std::isfinite(axes[0]) && std::isfinite(axes[1]) && std::isfinite(axes[2])) << trial;
+    EXPECT_LE(axes[2], 1e-7 * axes[0]);
+    const double trace = element(0, 0) + element(1, 1) + element(2, 2);
+    EXPECT_NEAR(axes[0] * axes[0] + axes[1] * axes[1] + axes[2] * axes[2], trace, 1e-14 * trace);
+  }
+}
+
 TSMatrix symmetric2(double s11, double s21, double s22) {
   TSMatrix s(2);
   s(1, 1) = s11;

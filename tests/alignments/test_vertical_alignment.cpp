@@ -134,6 +134,7 @@ TEST(VerticalAlignment, ExtrapolatesAlongTheEndGrades) {
   ASSERT_TRUE(profile.getHeightAtChainExtr(1300.0, h, extrapolated));
   EXPECT_FALSE(extrapolated);
   EXPECT_FALSE(CAlntV().getHeightAtChainExtr(0.0, h));
+  for (const double absurd : {HUGE_VAL, -HUGE_VAL, std::nan("")}) EXPECT_FALSE(profile.getHeightAtChainExtr(absurd, h));
 }
 
 // The element at a chainage: a joint belongs to the later element, 1 mm of tolerance at both ends.

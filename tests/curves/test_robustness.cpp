@@ -77,7 +77,8 @@ TEST(CurveRange, UndefinedCurvesFailWithALogEntryAndZeroValues) {
   EXPECT_FALSE(!tangent.setLen(20.0) || tangent.getPosAtLength(1.0, n, e));  // a length without an azimuth
   EXPECT_EQ(capture.count(), 5u);
   for (const double zero : {clothoid.GetAzimuth(10.0), clothoid.getCurvatureAtLength(10.0),
-                            clothoid.getLengthAtAzimuth(CMathAngle(10.0)), spiral.getCurvatureAtLength(1.0)}) {
+                            clothoid.getLengthAtAzimuth(CMathAngle(10.0)), spiral.getCurvatureAtLength(1.0),
+                            spiral.getRadius(), spiral.getSpiralParam()}) {
     EXPECT_EQ(zero, 0.0);
   }
   EXPECT_TRUE(clothoid.checkStepForDeviation(10.0, 0.0, 0.01) && std::isnan(spiral.getFinalNorthing()));

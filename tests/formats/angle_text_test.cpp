@@ -25,7 +25,7 @@ TEST(AngleTextWriting, PadsFieldsCarriesAndSigns) {
       {DMSToString, kDms, 2, L"45\u00B030'15.25\""},          {DMSToString, -0.5, 0, L"-0\u00B030'00\""},
       {DMSToString, 359.99999999, 2, L"360\u00B000'00.00\""}, {DMSToString, -0.00000001, 2, L"0\u00B000'00.00\""},
       {DMSToString, 1.0, -3, L"1\u00B000'00\""},              {DMMToString, -12.0 + -5.5 / 60, 1, L"-12\u00B005.5'"},
-      {DMMToString, 10.99999, 2, L"11\u00B000.00'"},          {DegreeToString, -2.675, 2, L"-2.68\u00B0"},
+      {DMMToString, 10.99999, 2, L"11\u00B000.00'"},          {DMMToString, -0.00001, 2, L"0\u00B000.00'"},          {DegreeToString, -2.675, 2, L"-2.68\u00B0"},
       {DegreeToBearing, 0.0, 0, L"N 0\u00B000'00\" E"},       {DegreeToBearing, 180.0, 0, L"S 0\u00B000'00\" E"},
       {DegreeToBearing, 270.0, 0, L"N 90\u00B000'00\" W"},    {DegreeToBearing, -45.0, 0, L"N 45\u00B000'00\" W"},
       {DegreeToBearing, 405.0, 0, L"N 45\u00B000'00\" E"},

@@ -106,6 +106,15 @@ TEST(AngleQueries, TangentsQuadrantsUpperEndAndDms) {
   EXPECT_EQ(d * 100 + m, 30);
   CMathAngle(-12.51).getDMS(d, m, s);
   EXPECT_TRUE(d == -12 && m == 30 && std::fabs(s - 36) < 1e-9);
+  // A rounding hair below a whole degree carries into the degrees: never 0 degrees 60 minutes.
+  for (double whole : {1.0, -1.0, 2.0}) {
+    for (double x = whole, step = 0; step < 8; ++step) {
+      x = std::nextafter(x, 0.0);
+      CMathAngle(x).getDMS(d, m, s);
+      EXPECT_TRUE(m < 60 && std::fabs(std::fabs(d) * 3600 + m * 60 + s - std::fabs(whole) * 3600) < 1e-6)
+          << x << ": " << d << " " << m << " " << s;
+    }
+  }
   // Whole seconds survive the radian round trip without a 60 in any field.
   for (int sec = 0; sec < 360 * 3600; sec += 997) {
     CMathAngle(sec / 3600.0).getDMS(d, m, s);

@@ -104,6 +104,7 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
       {"profile height", "--pvi"}, {"profile height --pvi 0,100", "at least two"},
       {"profile height --pvi 0,100 --pvi 50", "CH,H[,L]"},
       {"profile height --pvi 0,100 --pvi 100,101,150 --pvi 150,100", "must not overlap"},
+      {"road catch", "--cut, --fill"}, {"road catch --cut -2", "--cut"},
       {"cogo intersect --mode xy", "--mode"}, {"traverse adjust", "--start"}, {"traverse adjust --start 1", "--start"},
       {"traverse adjust --start 0,0 --rule simple", "--rule"},
   };
@@ -118,8 +119,8 @@ TEST(SvyUsage, OneLineErrorAndExitStatusTwo) {
   }
   const SvyResult help = runSvy({"--help"});
   EXPECT_EQ(help.exitStatus, 0);
-  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time", "traverse",
-                             "view", "profile"}) {
+  for (const char* family : {"cogo", "angle", "station", "units", "curve", "spiral", "fit", "geo", "time",
+                             "traverse", "view", "profile", "road"}) {
     EXPECT_NE(help.out.find(family), std::string::npos) << family;
   }
 }
@@ -134,6 +135,23 @@ TEST(ProfileHeight, GradesAndMiddleOrdinates) {
                    "1200.0000,55.1000,0.0000\n1350.0000,51.5000,-3.0000\n1500.0000,47.0000,-3.0000\n");
   EXPECT_EQ(r.errLines(),
             std::vector<std::string>{"svy: line 7: chainage 1500.5000 lies outside the profile (1000.0000 to 1500.0000)"});
+}
+
+// svy road catch: cut 2:1 and fill 3:1 from hinges on both sides onto level and sloping ground (the catch
+// point on both the slope and the ground line), a slope the ground outruns, and a short row.
+TEST(RoadCatch, CutAndFillOnBothSides) {
+  const std::string rows = "hinge_offset,hinge_elevation,ground_offset,ground_elevation\n10,100,15,103\n-10,100,-20,98\n1,2,3\n";
+  const SvyResult level = runSvy({"road", "catch", "--cut", "2", "--fill", "3"}, rows);
+  EXPECT_EQ(level.exitStatus, 1);
+  EXPECT_EQ(level.out, "catch_offset,catch_elevation,slope,run_rise\n16.0000,103.0000,cut,2.0000\n"
+                       "-16.0000,98.0000,fill,-3.0000\n");
+  EXPECT_EQ(level.errLines(), std::vector<std::string>{"svy: line 4: expected 4 numbers, got 3"});
+  // Ground rising 10 % to the right: 100 + l / 2 = 102 + l / 10 at l = 5; at 60 % it outruns the cut slope.
+  const SvyResult sloping = runSvy({"road", "catch", "--cut", "2", "--ground-grade", "10"}, "10,100,0,101\n");
+  EXPECT_EQ(sloping.out, "catch_offset,catch_elevation,slope,run_rise\n15.0000,102.5000,cut,2.0000\n");
+  const SvyResult steep = runSvy({"road", "catch", "--cut", "2", "--ground-grade", "60"}, "10,100,10,101\n");
+  EXPECT_EQ(steep.exitStatus, 1);
+  EXPECT_EQ(steep.errLines(), std::vector<std::string>{"svy: line 1: the slope does not meet the ground"});
 }
 
 // svy angle convert: known equivalents, the packed DDD.MMSS quirks, and round trips through every unit.

@@ -8,6 +8,7 @@
 #include <cerrno>
 #include <charconv>
 #include <cmath>
+#include <cstdio>
 #include <cstring>
 #include <fstream>
 #include <iostream>
@@ -23,6 +24,10 @@ constexpr int kRoundTripDigits = 17;
 // Widest fixed-point text we write: 309 integer digits of DBL_MAX, the point and up to 17 decimals.
 constexpr std::size_t kNumberBufferSize = 400;
 constexpr int kMaxDecimals = 17;
+// A byte-order mark that editors on some systems put at the start of a UTF-8 file.
+constexpr char kUtf8ByteOrderMark[] = "\xEF\xBB\xBF";
+// Input echoed in a message is cut after this many bytes: a field of a megabyte still gives a short line.
+constexpr std::size_t kMaxEchoBytes = 40;
 
 bool isBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\f' || c == '\v'; }
 
@@ -41,7 +46,8 @@ bool equalNoCase(const std::string& a, const std::string& b) {
 }
 
 // Splits one CSV line: commas separate fields, double quotes protect commas, "" inside quotes is a quote.
-std::vector<std::string> splitCsv(const std::string& line) {
+// Sets unclosed when the line ends inside quotes.
+std::vector<std::string> splitCsv(const std::string& line, bool& unclosed) {
   std::vector<std::string> fields;
   std::string field;
   bool quoted = false;
@@ -70,6 +76,7 @@ std::vector<std::string> splitCsv(const std::string& line) {
     }
   }
   fields.push_back(wasQuoted ? field : trim(field));
+  unclosed = quoted;
   return fields;
 }
 
@@ -159,6 +166,15 @@ OutputOptions outputOptionsFor(const CLI::App& command) {
   return options;
 }
 
+CLI::Option* requireNumberText(CLI::Option* option) {
+  return option->check(CLI::Validator(
+      [](const std::string& text) {
+        double value = 0.0;
+        return parseNumber(text, value) ? std::string() : "expected a number, got " + quoteForMessage(text);
+      },
+      "NUMBER"));
+}
+
 std::shared_ptr<std::string> addInputArgument(CLI::App& verb) {
   auto path = std::make_shared<std::string>();
   verb.add_option("file", *path, "CSV input file (default: standard input)");
@@ -188,13 +204,16 @@ bool RowReader::next(InputRow& row) {
   std::string line;
   while (std::getline(in_, line)) {
     ++lineNumber_;
+    if (lineNumber_ == 1 && line.rfind(kUtf8ByteOrderMark, 0) == 0) line.erase(0, sizeof kUtf8ByteOrderMark - 1);
     if (!isContentLine(line)) continue;
-    std::vector<std::string> fields = splitCsv(line);
+    bool unclosedQuote = false;
+    std::vector<std::string> fields = splitCsv(line, unclosedQuote);
     const bool first = !seenContent_;
     seenContent_ = true;
     if (first && isHeader(fields)) continue;
     row.lineNumber = lineNumber_;
     row.fields = std::move(fields);
+    row.unclosedQuote = unclosedQuote;
     row.numbers.clear();
     return true;
   }
@@ -284,11 +303,44 @@ void RowWriter::finish() {
   out_.flush();
 }
 
+std::string quoteForMessage(const std::string& text) {
+  if (text.size() <= kMaxEchoBytes) return "'" + text + "'";
+  // Cut before a UTF-8 continuation byte (10xxxxxx) never inside a character.
+  std::size_t cut = kMaxEchoBytes;
+  while (cut > 0 && (static_cast<unsigned char>(text[cut]) & 0xC0) == 0x80) --cut;
+  return "'" + text.substr(0, cut) + "...'";
+}
+
 void reportBadRow(std::size_t lineNumber, const std::string& message) {
-  std::cerr << "svy: line " << lineNumber << ": " << message << '\n';
+  // Control bytes of the input (NUL, a lone carriage return, escapes) are shown as \xNN, so that the
+  // message stays one printable line.
+  std::string shown;
+  shown.reserve(message.size());
+  for (const char c : message) {
+    const auto byte = static_cast<unsigned char>(c);
+    if (byte < 0x20 || byte == 0x7F) {
+      char escaped[8];
+      std::snprintf(escaped, sizeof escaped, "\\x%02X", byte);
+      shown += escaped;
+    } else {
+      shown += c;
+    }
+  }
+  std::cerr << "svy: line " << lineNumber << ": " << shown << '\n';
 }
 
 bool checkRow(const RowFormat& format, InputRow& row, std::string& error) {
+  if (row.unclosedQuote) {
+    error = "a double quote is not closed";
+    return false;
+  }
+  // The library reads text up to a NUL byte: "12\0x" would pass as "12".
+  for (const std::string& field : row.fields) {
+    if (field.find('\0') != std::string::npos) {
+      error = "a field holds a NUL byte";
+      return false;
+    }
+  }
   if (!fieldCountFits(format, row.fields.size())) {
     error = fieldCountMessage(format, row.fields.size());
     return false;
@@ -298,7 +350,7 @@ bool checkRow(const RowFormat& format, InputRow& row, std::string& error) {
   row.numbers.resize(row.fields.size());
   for (std::size_t i = 0; i < row.fields.size(); ++i) {
     if (!parseNumber(row.fields[i], row.numbers[i])) {
-      error = format.inputs[i] + ": '" + row.fields[i] + "' is not a number";
+      error = format.inputs[i] + ": " + quoteForMessage(row.fields[i]) + " is not a number";
       return false;
     }
   }
@@ -306,9 +358,10 @@ bool checkRow(const RowFormat& format, InputRow& row, std::string& error) {
 }
 
 bool parseNumberList(const std::string& text, std::size_t count, std::vector<double>& values) {
-  const std::vector<std::string> fields = splitCsv(text);
+  bool unclosedQuote = false;
+  const std::vector<std::string> fields = splitCsv(text, unclosedQuote);
   std::vector<double> parsed(fields.size());
-  if (fields.size() != count) return false;
+  if (fields.size() != count || unclosedQuote) return false;
   for (std::size_t i = 0; i < fields.size(); ++i) {
     if (!parseNumber(fields[i], parsed[i])) return false;
   }

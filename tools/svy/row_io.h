@@ -1,7 +1,8 @@
 #pragma once
 // Row input and output shared by every svy verb.
 //
-// Input: CSV rows from a file, or from stdin when the path is empty or "-". Blank lines and lines whose first
+// Input: CSV rows from a file, or from stdin when the path is empty or "-". A UTF-8 byte-order mark at the
+// start is skipped, and so is the carriage return of CRLF line ends. Blank lines and lines whose first
 // non-blank character is '#' are skipped; fields are trimmed; double-quoted fields may hold commas ("" is a
 // quote). The first content line is taken as a header and skipped when its fields equal the verb's input
 // column names (any case), or, for numeric input, when every field starts with a letter (a line of names). Line numbers count
@@ -44,6 +45,7 @@
 
 namespace CLI {
 class App;
+class Option;
 }
 
 namespace svy_tool {
@@ -61,6 +63,10 @@ struct OutputOptions {
 
 // Reads the global options from the root of the command a verb belongs to.
 OutputOptions outputOptionsFor(const CLI::App& command);
+
+// Makes a number option read its text as rows are read (parseNumber): "nan", "inf", hexadecimal and values
+// beyond the range of double are refused with "--radius: expected a number, got 'nan'". Returns the option.
+CLI::Option* requireNumberText(CLI::Option* option);
 
 // Adds the optional positional input file to a verb ("-" or nothing: stdin) and returns where its value goes;
 // the verb's callback keeps the returned pointer (and so the string) alive by capturing it.
@@ -83,6 +89,7 @@ using Cell = std::variant<double, std::string>;
 struct InputRow {
   std::size_t lineNumber = 0;       // 1-based physical line in the input
   std::vector<std::string> fields;  // trimmed, unquoted
+  bool unclosedQuote = false;       // a double quote opened and not closed: the fields are not trustworthy
   std::vector<double> numbers;      // the fields as numbers, filled by runRows() for numeric input
 };
 
@@ -163,7 +170,10 @@ class RowWriter {
   std::string envelopeRowsKey_;  // empty: a plain array
 };
 
-// Reports a bad row on stderr: "svy: line 7: <message>".
+// Input text for a message, in single quotes and cut to a few dozen bytes ("'1111111...'").
+std::string quoteForMessage(const std::string& text);
+
+// Reports a bad row on stderr: "svy: line 7: <message>", control bytes shown as \xNN.
 void reportBadRow(std::size_t lineNumber, const std::string& message);
 
 // The shape of a row-by-row verb: input column names (for the header and the messages), how many of them a

@@ -17,12 +17,14 @@ void registerFitVerbs(CLI::App& app);
 // "svy geo" (geodetic, earth-centred, local east/north/up) and "svy time" (GPS time).
 void registerGeoVerbs(CLI::App& app);
 void registerTimeVerbs(CLI::App& app);
-// "svy profile": heights and grades of a profile given by its vertical intersection points.
-void registerProfileVerbs(CLI::App& app);
 // "svy localize": plane localization (site calibration) fit and apply.
 void registerLocalizeVerbs(CLI::App& app);
 // "svy resect": free-station resection.
 void registerResectVerbs(CLI::App& app);
+// "svy profile": heights and grades of a profile given by its vertical intersection points.
+void registerProfileVerbs(CLI::App& app);
+// "svy road": catch points of cut and fill slopes (slope staking).
+void registerRoadVerbs(CLI::App& app);
 // "svy traverse": adjustment of a traverse between known points (compass and transit rules).
 void registerTraverseVerbs(CLI::App& app);
 // "svy view": screen positions of targets seen from an observer.

@@ -121,7 +121,7 @@ void addConvert(CLI::App& family) {
           const std::string& field = row.fields[0];
           double degrees = 0.0;
           if (!source.read(field, source.numeric ? row.numbers[0] : 0.0, degrees)) {
-            error = "value: '" + field + "' is not a " + source.name + " angle";
+            error = "value: " + svy_tool::quoteForMessage(field) + " is not a " + source.name + " angle";
             return false;
           }
           // The same unit is copied, so that a number keeps all its digits.

@@ -65,11 +65,14 @@ void addSolve(CLI::App& family) {
   auto radius = std::make_shared<double>(0.0);
   auto degArc = std::make_shared<double>(0.0);
   auto degChord = std::make_shared<double>(0.0);
-  CLI::Option* radiusOpt = verb->add_option("--radius", *radius, "Radius")->check(CLI::PositiveNumber);
-  CLI::Option* arcOpt = verb->add_option("--deg-arc", *degArc, "Degree of curve, arc definition (100-unit arc)")
+  CLI::Option* radiusOpt =
+      svy_tool::requireNumberText(verb->add_option("--radius", *radius, "Radius"))->check(CLI::PositiveNumber);
+  CLI::Option* arcOpt = svy_tool::requireNumberText(
+                            verb->add_option("--deg-arc", *degArc, "Degree of curve, arc definition (100-unit arc)"))
                             ->check(CLI::PositiveNumber);
   CLI::Option* chordOpt =
-      verb->add_option("--deg-chord", *degChord, "Degree of curve, chord definition (100-unit chord)")
+      svy_tool::requireNumberText(
+          verb->add_option("--deg-chord", *degChord, "Degree of curve, chord definition (100-unit chord)"))
           ->check(CLI::Range(0.0, 180.0));
   radiusOpt->excludes(arcOpt)->excludes(chordOpt);
   arcOpt->excludes(chordOpt);
@@ -77,7 +80,8 @@ void addSolve(CLI::App& family) {
   auto values = std::make_shared<std::vector<double>>(std::size(kQuantities), 0.0);
   std::vector<CLI::Option*> quantityOpts;
   for (std::size_t i = 0; i < std::size(kQuantities); ++i) {
-    quantityOpts.push_back(verb->add_option(kQuantities[i].option, (*values)[i], kQuantities[i].description)
+    quantityOpts.push_back(svy_tool::requireNumberText(
+                               verb->add_option(kQuantities[i].option, (*values)[i], kQuantities[i].description))
                                ->check(CLI::NonNegativeNumber));
   }
   for (std::size_t i = 0; i < quantityOpts.size(); ++i) {
@@ -153,11 +157,14 @@ void addIp(CLI::App& family) {
   auto spiralIn = std::make_shared<double>(0.0);
   auto spiralOut = std::make_shared<double>(0.0);
   auto type = std::make_shared<std::string>("clothoid");
-  verb->add_option("--radius", *radius, "Radius of the arc (the turn comes from the points)")
+  svy_tool::requireNumberText(
+      verb->add_option("--radius", *radius, "Radius of the arc (the turn comes from the points)"))
       ->required()
       ->check(CLI::PositiveNumber);
-  verb->add_option("--spiral-in", *spiralIn, "Length of the entry spiral (TS to SC)")->check(CLI::NonNegativeNumber);
-  verb->add_option("--spiral-out", *spiralOut, "Length of the exit spiral (CS to ST)")->check(CLI::NonNegativeNumber);
+  svy_tool::requireNumberText(verb->add_option("--spiral-in", *spiralIn, "Length of the entry spiral (TS to SC)"))
+      ->check(CLI::NonNegativeNumber);
+  svy_tool::requireNumberText(verb->add_option("--spiral-out", *spiralOut, "Length of the exit spiral (CS to ST)"))
+      ->check(CLI::NonNegativeNumber);
   verb->add_option("--type", *type, "Spiral law")->check(CLI::IsMember({"clothoid", "cubic"}));
 
   verb->callback([=] {
@@ -221,10 +228,14 @@ void addTable(CLI::App& family) {
   auto interval = std::make_shared<double>(0.0);
   auto exitSpiral = std::make_shared<bool>(false);
   verb->add_option("--type", *type, "Spiral law")->check(CLI::IsMember({"clothoid", "cubic"}));
-  verb->add_option("--length", *length, "Spiral length")->required()->check(CLI::PositiveNumber);
-  verb->add_option("--radius", *radius, "Radius at the curve end; negative for a spiral turning left")
+  svy_tool::requireNumberText(verb->add_option("--length", *length, "Spiral length"))
+      ->required()
+      ->check(CLI::PositiveNumber);
+  svy_tool::requireNumberText(
+      verb->add_option("--radius", *radius, "Radius at the curve end; negative for a spiral turning left"))
       ->required();
-  verb->add_option("--interval", *interval, "Length between rows (the end is always written)")
+  svy_tool::requireNumberText(
+      verb->add_option("--interval", *interval, "Length between rows (the end is always written)"))
       ->required()
       ->check(CLI::PositiveNumber);
   verb->add_flag("--exit", *exitSpiral, "Run from the curve out to the tangent (CS to ST)");

@@ -205,7 +205,8 @@ void addGridGround(CLI::App& family, const char* name, bool toGrid) {
   const std::shared_ptr<std::string> siteText = std::make_shared<std::string>();
   const std::shared_ptr<double> factor = std::make_shared<double>(svy_math::undefinedValue());
   verb->add_option("--base", *baseText, "Base point N,E common to both systems")->required();
-  CLI::Option* factorOption = verb->add_option("--factor", *factor, "Combined scale factor (grid / ground)");
+  CLI::Option* factorOption =
+      svy_tool::requireNumberText(verb->add_option("--factor", *factor, "Combined scale factor (grid / ground)"));
   verb->add_option("--site", *siteText, "LAT_DEG,MEAN_HEIGHT,GRID_SCALE: the factor from the site")
       ->excludes(factorOption);
   verb->callback([verb, input, baseText, siteText, factor, toGrid] {

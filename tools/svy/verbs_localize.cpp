@@ -47,7 +47,7 @@ int readControl(const std::string& path, ControlRows& control) {
     bool ok = svy_tool::checkRow(format, row, error);
     for (int k = 0; ok && k < 4; ++k) {
       ok = svy_tool::parseNumber(row.fields[k + 1], v[k]);
-      if (!ok) error = format.inputs[k + 1] + ": '" + row.fields[k + 1] + "' is not a number";
+      if (!ok) error = format.inputs[k + 1] + ": " + svy_tool::quoteForMessage(row.fields[k + 1]) + " is not a number";
     }
     if (!ok) {
       svy_tool::reportBadRow(row.lineNumber, error);
@@ -110,8 +110,8 @@ void addApply(CLI::App& family) {
   const std::shared_ptr<double> rotationDeg = std::make_shared<double>(0.0);
   const std::shared_ptr<std::string> shiftText = std::make_shared<std::string>();
   const std::shared_ptr<bool> inverse = std::make_shared<bool>(false);
-  verb->add_option("--scale", transform->scale, "Scale factor")->required();
-  verb->add_option("--rotation", *rotationDeg, "Rotation, degrees clockwise")->required();
+  svy_tool::requireNumberText(verb->add_option("--scale", transform->scale, "Scale factor"))->required();
+  svy_tool::requireNumberText(verb->add_option("--rotation", *rotationDeg, "Rotation, degrees clockwise"))->required();
   verb->add_option("--shift", *shiftText, "Shift N,E (metres)")->required();
   verb->add_flag("--inverse", *inverse, "From the `to` system back to the `from` system");
   verb->callback([verb, input, transform, rotationDeg, shiftText, inverse] {

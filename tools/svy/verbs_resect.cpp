@@ -34,7 +34,7 @@ bool parseSighting(const svy_tool::InputRow& row, svy_math::TResectionObservatio
     const std::string cell = k < row.fields.size() ? row.fields[k] : std::string();
     v[k - 1] = k == 7 ? 0.0 : svy_math::undefinedValue();
     if (!cell.empty() && !svy_tool::parseNumber(cell, v[k - 1])) {
-      error = kInputs[k] + ": '" + cell + "' is not a number";
+      error = kInputs[k] + ": " + svy_tool::quoteForMessage(cell) + " is not a number";
       return false;
     }
   }
@@ -65,11 +65,14 @@ void registerResectVerbs(CLI::App& app) {
   const std::shared_ptr<double> instrumentHeight = std::make_shared<double>(0.0);
   const std::shared_ptr<double> angleSdSeconds = std::make_shared<double>(3.0);
   const std::shared_ptr<double> distanceSd = std::make_shared<double>(svy_math::units::kDefaultDistanceSd);
-  verb->add_option("--instrument-height", *instrumentHeight, "Instrument height above the ground mark (metres)")
+  svy_tool::requireNumberText(
+      verb->add_option("--instrument-height", *instrumentHeight, "Instrument height above the ground mark (metres)"))
       ->required();
-  verb->add_option("--angle-sd", *angleSdSeconds, "Standard deviation of directions and zenith angles (arc seconds)")
+  svy_tool::requireNumberText(verb->add_option(
+      "--angle-sd", *angleSdSeconds, "Standard deviation of directions and zenith angles (arc seconds)"))
       ->default_val(3.0);
-  verb->add_option("--distance-sd", *distanceSd, "Standard deviation of distances (metres, plus 2 ppm)")
+  svy_tool::requireNumberText(
+      verb->add_option("--distance-sd", *distanceSd, "Standard deviation of distances (metres, plus 2 ppm)"))
       ->default_val(svy_math::units::kDefaultDistanceSd);
   verb->callback([verb, input, instrumentHeight, angleSdSeconds, distanceSd] {
     std::string error;

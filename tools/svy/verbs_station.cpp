@@ -6,6 +6,7 @@
 
 #include <CLI/CLI.hpp>
 
+#include <cctype>
 #include <climits>
 #include <cmath>
 #include <memory>
@@ -17,9 +18,43 @@ namespace {
 // Chainages to 0.1 mm, like the other lengths of the tool.
 constexpr int kChainageDecimals = 4;
 
+// The station texts a file may hold: metres ("1234.5") or a count of intervals and metres ("1+234.5"), each
+// part with an optional sign ("-1+-234.5") and the metres with a decimal point or comma, then at most a
+// unit word ("2+3 m"). The library's reader ignores whatever follows the last number, which suits text
+// typed into a host's field; in a file a tail of digits or separators is rather a typing error or a
+// thousands separator ("1,234.5" would read as 1.234 m), so it is refused here instead of giving a wrong
+// chainage.
+bool isStationText(const std::string& text) {
+  std::size_t i = 0;
+  const auto skipSign = [&] {
+    if (i < text.size() && (text[i] == '+' || text[i] == '-')) ++i;
+  };
+  const auto countDigits = [&] {
+    const std::size_t start = i;
+    while (i < text.size() && std::isdigit(static_cast<unsigned char>(text[i]))) ++i;
+    return i - start;
+  };
+  skipSign();
+  std::size_t wholeDigits = countDigits();
+  if (i < text.size() && text[i] == '+') {
+    if (wholeDigits == 0) return false;
+    ++i;
+    skipSign();
+    wholeDigits = countDigits();
+  }
+  std::size_t fractionDigits = 0;
+  if (i < text.size() && (text[i] == '.' || text[i] == ',')) {
+    ++i;
+    fractionDigits = countDigits();
+  }
+  while (i < text.size() && text[i] == ' ') ++i;
+  while (i < text.size() && std::isalpha(static_cast<unsigned char>(text[i]))) ++i;
+  return i == text.size() && wholeDigits + fractionDigits > 0;
+}
+
 // The station interval option: metres per station unit, e.g. 1000 or 100.
 void addIntervalOption(CLI::App& verb, double& interval) {
-  verb.add_option("--interval", interval, "Metres per station unit (e.g. 1000 or 100)")
+  svy_tool::requireNumberText(verb.add_option("--interval", interval, "Metres per station unit (e.g. 1000 or 100)"))
       ->required()
       ->check(CLI::PositiveNumber);
 }
@@ -58,9 +93,9 @@ void addParse(CLI::App& family) {
         [interval](const svy_tool::InputRow& row, std::vector<svy_tool::Cell>& out, std::string& error) {
           const std::string& text = row.fields[0];
           double chainage = 0.0;
-          if (StnFromString(svy_text::CSvyString(text.c_str()), chainage, *interval) != 1 ||
+          if (!isStationText(text) || StnFromString(svy_text::CSvyString(text.c_str()), chainage, *interval) != 1 ||
               !std::isfinite(chainage)) {
-            error = "'" + text + "' is not a station";
+            error = svy_tool::quoteForMessage(text) + " is not a station";
             return false;
           }
           out = {text, chainage};

@@ -73,11 +73,13 @@ bool parseCalendarTime(const std::string& text, CalendarTime& t, std::string& er
                        readDigits(text, 14, 2, t.minute) && text[16] == ':' && readDigits(text, 17, 2, wholeSecond);
   int fraction = 0;
   const std::size_t fractionDigits = text.size() > 20 ? text.size() - 20 : 0;
-  const bool fractionOk = text.size() == 19 || (text[19] == '.' && fractionDigits >= 1 &&
-                                                fractionDigits <= kMaxFractionDigits &&
-                                                readDigits(text, 20, fractionDigits, fraction));
-  if (!shapeOk || !fractionOk) {
-    error = "expected a time YYYY-MM-DDThh:mm:ss[.fff], got '" + text + "'";
+  // Only a text of the full shape has a character 19 to look at.
+  const bool fractionOk =
+      shapeOk && (text.size() == 19 || (text[19] == '.' && fractionDigits >= 1 &&
+                                        fractionDigits <= kMaxFractionDigits &&
+                                        readDigits(text, 20, fractionDigits, fraction)));
+  if (!fractionOk) {
+    error = "expected a time YYYY-MM-DDThh:mm:ss[.fff], got " + svy_tool::quoteForMessage(text);
     return false;
   }
   t.second = wholeSecond + fraction / std::pow(10.0, static_cast<double>(fractionDigits));
@@ -85,11 +87,11 @@ bool parseCalendarTime(const std::string& text, CalendarTime& t, std::string& er
                            (t.year == kFirstGpsYear && t.month == kEpochMonth && t.day < kEpochDay);
   if (t.month < 1 || t.month > kMonthsPerYear || t.day < 1 || t.day > daysInMonth(t.year, t.month) ||
       t.hour >= kHoursPerDay || t.minute >= kMinutesPerHour || t.second >= kSecondsPerMinute) {
-    error = "no such date or time: '" + text + "'";
+    error = "no such date or time: " + svy_tool::quoteForMessage(text);
     return false;
   }
   if (beforeEpoch || t.year > kLastYear) {
-    error = "times run from the GPS epoch 1980-01-06 to 2099-12-31, got '" + text + "'";
+    error = "times run from the GPS epoch 1980-01-06 to 2099-12-31, got " + svy_tool::quoteForMessage(text);
     return false;
   }
   return true;
