@@ -34,6 +34,7 @@ int runCommand(int argc, const char* const* argv) {
     registerTraverseVerbs(app);
     registerViewVerbs(app);
     registerAreaVerbs(app);
+    registerAlignVerbs(app);
 
     try {
       app.parse(argc, argv);

@@ -31,3 +31,4 @@ void registerTraverseVerbs(CLI::App& app);
 void registerViewVerbs(CLI::App& app);
 // "svy area": area and perimeter of a boundary of lines and arcs, and its subdivision by a known area.
 void registerAreaVerbs(CLI::App& app);
+void registerAlignVerbs(CLI::App& app);
