@@ -100,6 +100,15 @@ TEST(NumberTextRoundTrip, WrittenTextReadsBackAsTheRoundedValue) {
   EXPECT_EQ(commas.str(), L"1.5;2.25.");
 }
 
+// Found by fuzzing: rounding a number near the largest double to a large power of ten carries past it. The
+// text is the true decimal rounding, which no double can hold, so it does not read back.
+TEST(NumberTextRoundTrip, RoundingPastTheLargestDoubleIsWrittenButDoesNotReadBack) {
+  const CSvyString text = svy_formats::DoubleToString(1.7976922785710768e+308, -304);
+  EXPECT_EQ(text.ToNarrow(), "17977" + std::string(304, '0'));
+  double parsed = 0.0;
+  EXPECT_FALSE(svy_formats::StringToDouble(text, parsed));
+}
+
 // A host whose C++ locale (and, when one is installed, C locale) has a decimal comma changes no text.
 TEST(NumberText, HostDecimalCommaChangesNothing) {
   struct CommaPunct : std::numpunct<char> {
